@@ -1,0 +1,45 @@
+// A table read once into memory: the whole records it held when it was first needed.
+#ifndef VPDDB_SRC_TABLE_SNAPSHOT_H_
+#define VPDDB_SRC_TABLE_SNAPSHOT_H_
+
+#include <cstdint>
+#include <cstring>
+#include <vector>
+
+#include "locid.h"
+#include "table_desc.h"
+
+namespace vpd {
+
+class TableSnapshot {
+ public:
+  // Reads the open file from offset 0 to its end. A trailing partial record, and anything
+  // after an I/O error, is left out: only whole records are ever examined.
+  TableSnapshot(int fd, const TableDesc& desc);
+
+  std::size_t count() const { return count_; }
+  std::size_t recordSize() const { return record_size_; }
+  const unsigned char* record(std::size_t i) const { return bytes_.data() + i * record_size_; }
+
+  // A byte-for-byte copy of record i into a record object.
+  template <class Record>
+  void copyInto(std::size_t i, Record& out) const {
+    static_assert(sizeof(Record) >= 4, "records begin with their location");
+    std::memcpy(static_cast<void*>(&out), record(i), sizeof(Record));
+  }
+
+  loc_id_t location(std::size_t i) const {
+    uint32_t word;
+    std::memcpy(&word, record(i), sizeof word);
+    return loc_id_t(word);
+  }
+
+ private:
+  std::vector<unsigned char> bytes_;
+  std::size_t record_size_;
+  std::size_t count_ = 0;
+};
+
+}  // namespace vpd
+
+#endif  // VPDDB_SRC_TABLE_SNAPSHOT_H_
