@@ -1,0 +1,45 @@
+// Network VPD of one switch chassis: a header stanza (MTMS, managing consoles, the frame's
+// BPA), the FRU stanzas of board, DCAs and risers, and one cable line per riser jack.
+//
+// Location codes:  local jack      U<tm><se>-P1-C<slot>-T<jack>
+//                  switch far end  U<tm><se>-P1-C<slot>-T<jack>   (the far chassis)
+//                  SMA far end     U<tm><se>-P1-H<h>Q<q>          (the CEC of the SMA)
+// where <tm><se> are the MTMS fields up to their first NUL, with no separator.
+#ifndef DORVEX_SWITCH_NETVPD_H_
+#define DORVEX_SWITCH_NETVPD_H_
+
+#include <string>
+
+#include "vpdDB.h"
+
+namespace dorvex {
+
+// Riser slots reported per chassis: the first 15 of the 16 (the last one never is).
+constexpr int kReportedRisers = 15;
+
+// Writes the network VPD of one switch chassis; `bpadata` is the BPA record of its frame as
+// the caller found it (possibly empty). Console lines come from zev. Far ends of cables are
+// looked up in `vpd`, the request's one database. Returns 0.
+int outputnetvpdSW(vpdDB& vpd, chassisVPD switchdata, bpaVPD bpadata);
+
+// Writes the cable line of one local jack: "*CB " and the quoted pair of the local and the
+// far location. `locid` and `port` are the far end as stored in the riser slot, `fromriser`
+// the 0-based local slot, `fromjack` 1 or 2. A far end of another type than NSB, ISB or SMA
+// gives no line. Returns 0.
+int outputCBinfo(vpdDB& vpd, mtms framemtms, loc_id_t locid, int port, int fromriser, int fromjack);
+
+// "1" to "16" for 1 to 16; the empty text for anything else.
+std::string riseritoa(int n);
+
+// The 0-based riser slot on a far switch chassis reached by chip `chip`, or -1 when the
+// chip has no slot (above 7).
+int farRiserSlot(unsigned int chip);
+
+// The H and Q digits of an SMA far end (from its SMA chip number); empty for a chip with
+// no SMA chip number.
+std::string smaHDigit(unsigned char sma_chip);
+std::string smaQDigit(unsigned char sma_chip);
+
+}  // namespace dorvex
+
+#endif  // DORVEX_SWITCH_NETVPD_H_
