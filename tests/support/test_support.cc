@@ -99,7 +99,7 @@ RunResult run(const std::vector<std::string>& argv, const std::map<std::string, 
   std::map<std::string, std::string> vars;
   for (char** e = environ; *e != nullptr; ++e) {
     const char* eq = std::strchr(*e, '=');
-    if (eq != nullptr) vars[std::string(*e, eq)] = eq + 1;
+    if (eq != nullptr) vars[std::string(*e, static_cast<size_t>(eq - *e))] = eq + 1;
   }
   for (const auto& kv : env) {
     if (kv.second == "\x01unset") {
