@@ -60,13 +60,14 @@ struct smaVPD {
   loc_id_t loc_id;
   fru_stanza sma_fru;
   mtms cec_mtms;         // the CEC the SMA belongs to
+  char padding_[3];      // explicit, so that it is zero on disk like every unused byte
   loc_id_t neighbor_id;  // the switch chassis the adapter is cabled to
   char timestamp[kTimestampBytes];
 
   static constexpr std::size_t kRecordSize = 160;  // bytes on disk
 
   smaVPD(const smaVPD&) = default;
-  smaVPD() : loc_id(0), sma_fru(), cec_mtms(), neighbor_id(0), timestamp{} {}
+  smaVPD() : loc_id(0), sma_fru(), cec_mtms(), padding_{}, neighbor_id(0), timestamp{} {}
   smaVPD& operator=(const smaVPD& o) {
     loc_id = o.loc_id;
     sma_fru = o.sma_fru;
@@ -79,7 +80,7 @@ struct smaVPD {
   void setLocid(loc_id_t l) { loc_id = l; }
   void setNeighborid(loc_id_t l) { neighbor_id = l; }
   // Copies the text and NUL-pads the field; at most 28 bytes.
-  void setTimestamp(const char* t) { std::strncpy(timestamp, t ? t : "", kTimestampBytes); }
+  void setTimestamp(const char* t) { vpd::copyPadded(timestamp, kTimestampBytes, t); }
   void setCECmtms(const mtms& m) { cec_mtms = m; }
   void setSmafru(const fru_stanza& f) { sma_fru = f; }
   loc_id_t getLocid() const { return loc_id; }
@@ -98,13 +99,15 @@ struct chassisVPD {
   fru_stanza sw_fru;  // switch board
   fru_stanza dca1_fru;
   fru_stanza dca2_fru;
+  char padding_[3];
   riser_vpd_t riser[kRiserSlots];
   char timestamp[kTimestampBytes];
 
   static constexpr std::size_t kRecordSize = 2284;  // bytes on disk
 
   chassisVPD(const chassisVPD&) = default;
-  chassisVPD() : loc_id(0), sw_mtms(), sw_fru(), dca1_fru(), dca2_fru(), riser(), timestamp{} {}
+  chassisVPD()
+      : loc_id(0), sw_mtms(), sw_fru(), dca1_fru(), dca2_fru(), padding_{}, riser(), timestamp{} {}
   chassisVPD& operator=(const chassisVPD& o) {
     loc_id = o.loc_id;
     sw_mtms = o.sw_mtms;
@@ -119,7 +122,7 @@ struct chassisVPD {
   // Slot arguments are 0-based indexes; an index outside 0 to 15 is ignored by the
   // setters and reads as an empty slot through the getters.
   void setLocid(loc_id_t l) { loc_id = l; }
-  void setTimestamp(const char* t) { std::strncpy(timestamp, t ? t : "", kTimestampBytes); }
+  void setTimestamp(const char* t) { vpd::copyPadded(timestamp, kTimestampBytes, t); }
   void setSWmtms(const mtms& m) { sw_mtms = m; }
   void setSWfru(const fru_stanza& f) { sw_fru = f; }
   void setDca1(const fru_stanza& f) { dca1_fru = f; }
@@ -168,6 +171,7 @@ struct bpaVPD {
   fru_stanza bpc2_fru;
   fru_stanza bpr2_fru[kUnitsPerKind];
   fru_stanza bpd2_fru[kUnitsPerKind];
+  char padding_[3];
 
   static constexpr std::size_t kRecordSize = 1508;  // bytes on disk
 
@@ -181,7 +185,8 @@ struct bpaVPD {
         bpd1_fru(),
         bpc2_fru(),
         bpr2_fru(),
-        bpd2_fru() {}
+        bpd2_fru(),
+        padding_{} {}
   ~bpaVPD() = default;
   bpaVPD& operator=(const bpaVPD& o) {
     loc_id = o.loc_id;
@@ -201,7 +206,7 @@ struct bpaVPD {
   // Index arguments are 0 to 2; another index is ignored by the setters and reads as an
   // empty FRU through the getters.
   void setLocid(loc_id_t l) { loc_id = l; }
-  void setTimestamp(const char* t) { std::strncpy(timestamp, t ? t : "", kTimestampBytes); }
+  void setTimestamp(const char* t) { vpd::copyPadded(timestamp, kTimestampBytes, t); }
   void setMtms(const mtms& m) { frame_mtms = m; }
   void setBpc1(const fru_stanza& f) { bpc1_fru = f; }
   void setBpr1(const fru_stanza& f, int i) { put(bpr1_fru, f, i); }

@@ -31,6 +31,14 @@ inline void boundedCopy(char* dst, std::size_t significant, const char* src, int
   if (len < limit) std::memset(dst + len, 0, limit - len);
 }
 
+// Copies a text into a field of `size` bytes that need no terminator (a timestamp): at most
+// `size` bytes, NUL-padded. A null src clears the field.
+inline void copyPadded(char* dst, std::size_t size, const char* src) {
+  std::size_t len = src == nullptr ? 0 : strnlen(src, size);
+  if (len > 0) std::memmove(dst, src, len);
+  std::memset(dst + len, 0, size - len);
+}
+
 }  // namespace vpd
 
 #endif  // VPDDB_INCLUDE_VPD_TEXT_H_
