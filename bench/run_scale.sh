@@ -1,0 +1,182 @@
+#!/usr/bin/env bash
+# Times dorvex and vpdload on generated installations of growing size, next to the floor of
+# reading the same bytes with cat, and checks the performance targets.
+#
+#   bench/run_scale.sh [--scales "1 4 16 64"] [--runs N] [--no-build] [--keep DIR]
+#
+# Builds Release in build-bench/ (BUILD_DIR overrides), generates one installation per
+# scale (scale 64: 1024 switch chassis on one network, 4096 CECs with 8 SMA records each,
+# 256 frames, about 8 MB of tables), and for each request prints the fastest time, the
+# floor, their ratio, the growth from the previous size, the mean CPU times and the peak
+# memory. Takes about three minutes on two cores. Needs hyperfine, /usr/bin/time, python3.
+set -euo pipefail
+
+here=$(cd "$(dirname "$0")" && pwd)
+repo=$(dirname "$here")
+build=${BUILD_DIR:-$repo/build-bench}
+scales=(1 4 16 64)
+runs=15
+import_runs=5
+do_build=1
+keep=""
+
+while [ $# -gt 0 ]; do
+  case "$1" in
+    --scales) read -r -a scales <<<"$2"; shift 2 ;;
+    --runs) runs=$2; shift 2 ;;
+    --no-build) do_build=0; shift ;;
+    --keep) keep=$2; shift 2 ;;
+    -h|--help) sed -n '2,11p' "$0" | sed 's/^# \{0,1\}//'; exit 0 ;;
+    *) echo "run_scale.sh: unknown argument $1" >&2; exit 2 ;;
+  esac
+done
+
+for tool in hyperfine /usr/bin/time python3; do
+  command -v "$tool" >/dev/null || { echo "run_scale.sh: $tool is needed" >&2; exit 2; }
+done
+
+if [ "$do_build" = 1 ]; then
+  cmake -S "$repo" -B "$build" -DDORVEX_BUILD_BENCH=ON -DCMAKE_BUILD_TYPE=Release >/dev/null
+  cmake --build "$build" -j2 --target dorvex vpdload rackprobe nodebridge rackpower \
+    gen_installation >/dev/null
+fi
+dorvex=$build/dorvex/dorvex
+vpdload=$build/tools/vpdload/vpdload
+rackprobe=$build/platform/rackprobe/rackprobe
+gen=$build/bench/gen_installation
+
+if [ -n "$keep" ]; then
+  work=$keep
+  mkdir -p "$work"
+else
+  work=$(mktemp -d "${TMPDIR:-/tmp}/run_scale.XXXXXX")
+  trap 'rm -rf "$work"' EXIT
+fi
+
+# dorvex's traces (none are expected) stay out of syslog.
+export CHRONICLE_LOG=/dev/null
+
+results=$work/results.tsv
+: >"$results"
+
+# The fastest wall time of a hyperfine JSON export and the mean CPU time (user + system),
+# in milliseconds. The fastest run is the one least disturbed by other work on the machine.
+times_ms() {
+  python3 -c 'import json,sys; r = json.load(open(sys.argv[1]))["results"][0]; print("%.3f\t%.3f" % (r["min"] * 1000, (r["user"] + r["system"]) * 1000))' "$1"
+}
+
+# time_cmd NAME RUNS CMD...: fastest wall and mean CPU milliseconds on stdout
+time_cmd() {
+  local name=$1 n=$2
+  shift 2
+  hyperfine -N --warmup 2 --runs "$n" --export-json "$work/$name.json" "$(printf '%q ' "$@")" \
+    >/dev/null 2>&1 || { echo "run_scale.sh: timing '$*' failed" >&2; exit 1; }
+  times_ms "$work/$name.json"
+}
+
+# peak_kib CMD...: the largest resident set of the command, in KiB
+peak_kib() {
+  /usr/bin/time -v "$@" 2>&1 >/dev/null | awk -F': ' '/Maximum resident set size/ {print $2}'
+}
+
+# measure REQUEST SCALE TABLE_BYTES RUNS "FLOOR FILES" CMD...
+measure() {
+  local request=$1 scale=$2 table_bytes=$3 n=$4 floor_files=$5
+  shift 5
+  local t f kib
+  t=$(time_cmd "$request-$scale" "$n" "$@")
+  # shellcheck disable=SC2086  # the floor files are a list
+  f=$(time_cmd "$request-$scale-floor" "$n" cat $floor_files)
+  kib=$(peak_kib "$@")
+  printf '%s\t%s\t%s\t%s\t%s\t%s\n' "$request" "$scale" "$table_bytes" "$t" "$f" "$kib" >>"$results"
+}
+
+for scale in "${scales[@]}"; do
+  root=$work/scale$scale
+  rm -rf "$root"
+  "$gen" --scale "$scale" "$root" >/dev/null
+  mkdir -p "$root/bin"
+  ln -s "$rackprobe" "$root/bin/rackprobe"
+  export OLV_ROOT=$root
+  data=$root/data
+  tables="$data/chassis_vpd.db $data/bpa_vpd.db $data/sma_vpd.db"
+  # shellcheck disable=SC2086
+  table_bytes=$(stat -c %s $tables | awk '{s += $1} END {print s}')
+
+  # The last switch chassis and the last CEC that the dump lists.
+  read -r sw_frame sw_cage < <(awk '$3 == "SW_CHIP" {f = $1; c = $2} END {print f, c}' "$root/etc/rackprobe.dump")
+  read -r cec_frame cec_cage < <(awk '$3 == "SMA" {f = $1; c = $2} END {print f, c}' "$root/etc/rackprobe.dump")
+
+  declare -A cmd=(
+    [netvpd]="-y netvpd -n 1"
+    [part]="-y switch -f $sw_frame -c $sw_cage -r dca -h 1"
+    [location]="-y cec -f $cec_frame -c $cec_cage"
+    [poll]="-y cec -t 0"
+    [dump]="-y all"
+  )
+  declare -A floor=(
+    [netvpd]="$tables $work/netvpd.out"
+    [part]="$data/chassis_vpd.db"
+    [location]="$data/sma_vpd.db"
+    [poll]="$data/sma_vpd.db $work/poll.out"
+    [dump]="$tables $work/dump.out"
+  )
+  for request in netvpd part location poll dump; do
+    # shellcheck disable=SC2086  # the options are words
+    if ! "$dorvex" ${cmd[$request]} >"$work/$request.out"; then
+      echo "run_scale.sh: dorvex ${cmd[$request]} failed at scale $scale" >&2
+      exit 1
+    fi
+    # shellcheck disable=SC2086
+    measure "$request" "$scale" "$table_bytes" "$runs" "${floor[$request]}" "$dorvex" ${cmd[$request]}
+  done
+
+  # vpdload: export once, then time the import of that inventory into a data folder of its own.
+  "$vpdload" export "$work/inventory.json"
+  import_dir=$work/import$scale
+  mkdir -p "$import_dir"
+  measure import "$scale" "$table_bytes" "$import_runs" "$work/inventory.json $tables" \
+    "$vpdload" --data "$import_dir" import "$work/inventory.json"
+  for t in chassis_vpd.db bpa_vpd.db sma_vpd.db; do
+    cmp -s "$data/$t" "$import_dir/$t" || { echo "run_scale.sh: import changed $t" >&2; exit 1; }
+  done
+  rm -rf "$root" "$import_dir"
+  unset cmd floor
+done
+
+echo "Machine: $(nproc) cores, $(awk '/MemTotal/ {printf "%.0f GiB", $2 / 1048576}' /proc/meminfo)," \
+  "$(lscpu | awk -F': *' '/Model name/ {print $2}'), load average $(cut -d' ' -f1-3 /proc/loadavg)"
+echo
+python3 - "$results" "${scales[-1]}" <<'EOF'
+import sys
+
+rows = [line.rstrip("\n").split("\t") for line in open(sys.argv[1])]
+largest = sys.argv[2]
+MIB = 1024 * 1024
+print("| request | scale | tables | time ms | floor ms | ratio | growth | CPU ms | floor CPU ms | peak RSS | check |")
+print("|---|---:|---:|---:|---:|---:|---:|---:|---:|---:|---|")
+previous = {}
+failures = 0
+for request, scale, table_bytes, t, cpu, f, fcpu, kib in rows:
+    table_bytes, t, cpu, f, fcpu = int(table_bytes), float(t), float(cpu), float(f), float(fcpu)
+    rss = int(kib) * 1024
+    ratio = t / f
+    growth = t / previous[request] if request in previous else None
+    previous[request] = t
+    failed = []
+    if request == "netvpd" and scale == largest and ratio > 3:
+        failed.append("ratio > 3")
+    if request in ("part", "location") and ratio > 2:
+        failed.append("ratio > 2")
+    if growth is not None and growth > 4.5:
+        failed.append("growth > 4.5")
+    if request != "import" and rss > table_bytes + 32 * MIB:
+        failed.append("memory > tables + 32 MiB")
+    failures += bool(failed)
+    print("| %s | %s | %.2f MB | %.2f | %.2f | %.2f | %s | %.2f | %.2f | %.1f MiB | %s |" % (
+        request, scale, table_bytes / 1e6, t, f, ratio,
+        "%.2f" % growth if growth is not None else "-", cpu, fcpu, rss / MIB,
+        "FAIL: " + ", ".join(failed) if failed else "PASS"))
+print()
+print("%d of %d rows failed" % (failures, len(rows)) if failures else "all %d rows pass" % len(rows))
+EOF
