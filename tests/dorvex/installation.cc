@@ -5,6 +5,9 @@
 
 #include <cstdlib>
 
+#include "output_stream.h"
+#include "settings.h"
+
 namespace dorvextest {
 
 // Modification time given to the SMA table, so that change polls have a known answer.
@@ -77,6 +80,26 @@ void expectRuns(Installation& inst, const std::vector<RunCase>& cases) {
     EXPECT_EQ(r.status, c.status) << c.name;
     EXPECT_EQ(r.err, "") << c.name;
   }
+}
+
+OutputCapture::OutputCapture() : file_(std::tmpfile()) {
+  dorvex::setOutStream(file_);
+  dorvex::resetSettings();
+}
+
+OutputCapture::~OutputCapture() {
+  dorvex::setOutStream(nullptr);
+  std::fclose(file_);
+}
+
+std::string OutputCapture::text() {
+  std::fflush(file_);
+  std::rewind(file_);
+  std::string all;
+  char buf[4096];
+  size_t n;
+  while ((n = std::fread(buf, 1, sizeof buf, file_)) > 0) all.append(buf, n);
+  return all;
 }
 
 void fillStandard(Installation& inst) {

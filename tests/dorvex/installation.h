@@ -3,6 +3,7 @@
 #ifndef TESTS_DORVEX_INSTALLATION_H_
 #define TESTS_DORVEX_INSTALLATION_H_
 
+#include <cstdio>
 #include <string>
 #include <vector>
 
@@ -54,6 +55,19 @@ struct RunCase {
   int status;
 };
 void expectRuns(Installation& inst, const std::vector<RunCase>& cases);
+
+// Points the writers of dorvex_core at a temporary file for its lifetime, and puts the
+// request settings back to their initial values.
+class OutputCapture {
+ public:
+  OutputCapture();
+  ~OutputCapture();
+  // Everything written so far.
+  std::string text();
+
+ private:
+  FILE* file_;
+};
 
 // The installation most end-to-end tests share: three switch chassis, two BPAs and the SMA
 // adapters of three CECs (see installation.cc for the values).

@@ -1,12 +1,16 @@
 // End-to-end: every request form but the network one, run as the built dorvex against the
 // standard installation; whole standard output and exit status.
+#include "requests.h"
+
 #include <gtest/gtest.h>
 
+#include <cstdio>
 #include <memory>
 #include <string>
 #include <vector>
 
 #include "installation.h"
+#include "settings.h"
 
 namespace dorvextest {
 namespace {
@@ -220,6 +224,26 @@ TEST_F(StandardInstallation, ListingRequests) {
       {"no type", {"-f", "2", "-c", "3"}, "", 2},
       {"switch dump", {"-y", "switch", "-c", "3"}, "", 2},
   });
+}
+
+// Without the SMA table's time there is nothing to compare: nothing is written and the
+// request counts as not performed (status 2).
+TEST(ChangePoll, UnreadableTableTimeWritesNothing) {
+  Installation inst;
+  fillStandard(inst);
+  inst.writeTables();
+  vpdDB db(inst.path("data"), 1);
+  for (bool readable : {true, false}) {
+    if (!readable) {
+      ASSERT_EQ(std::remove(inst.path("data/sma_vpd.db").c_str()), 0);
+    }
+    OutputCapture out;
+    dorvex::type = dorvex::kTypeCec;
+    dorvex::mtime = 0;
+    int rc = dorvex::changePoll(db);
+    EXPECT_EQ(rc == dorvex::kNothingPerformed, !readable);
+    EXPECT_EQ(out.text().empty(), !readable) << out.text();
+  }
 }
 
 TEST(DumpRequest, WritesTheThreeTablesInOrder) {

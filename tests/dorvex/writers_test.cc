@@ -15,31 +15,6 @@
 namespace dorvextest {
 namespace {
 
-// Points the writers at a temporary file for its lifetime.
-class Capture {
- public:
-  Capture() : file_(std::tmpfile()) {
-    dorvex::setOutStream(file_);
-    dorvex::resetSettings();
-  }
-  ~Capture() {
-    dorvex::setOutStream(nullptr);
-    std::fclose(file_);
-  }
-  std::string text() {
-    std::fflush(file_);
-    std::rewind(file_);
-    std::string all;
-    char buf[4096];
-    size_t n;
-    while ((n = std::fread(buf, 1, sizeof buf, file_)) > 0) all.append(buf, n);
-    return all;
-  }
-
- private:
-  FILE* file_;
-};
-
 TEST(Writers, SummaryLines) {
   struct {
     const char* name;
@@ -64,7 +39,7 @@ TEST(Writers, SummaryLines) {
        "P", "S", "C", "ab*1 P S C\n", 0},
   };
   for (const auto& c : fru_lines) {
-    Capture out;
+    OutputCapture out;
     EXPECT_EQ(dorvex::outputpnsn(c.m, c.pn, c.fn, c.cc), 0) << c.name;
     EXPECT_EQ(out.text(), c.out) << c.name;
     EXPECT_EQ(dorvex::prc, c.prc) << c.name;
@@ -86,7 +61,7 @@ TEST(Writers, SummaryLines) {
        "4095 255 12345678*1234567\n", 0},
   };
   for (const auto& c : enclosure_lines) {
-    Capture out;
+    OutputCapture out;
     EXPECT_EQ(dorvex::outputmtms(c.m, c.loc), 0) << c.name;
     EXPECT_EQ(out.text(), c.out) << c.name;
     EXPECT_EQ(dorvex::prc, c.prc) << c.name;
@@ -95,7 +70,8 @@ TEST(Writers, SummaryLines) {
 
 TEST(Writers, FruStanzas) {
   fru_stanza full_width;
-  std::memset(static_cast<void*>(&full_width), 'A', sizeof full_width);  // no terminator in any field
+  std::memset(static_cast<void*>(&full_width), 'A',
+              sizeof full_width);  // no terminator in any field
   mtms full_mtms;
   std::memset(static_cast<void*>(&full_mtms), 'B', sizeof full_mtms);
   const std::string a30(30, 'A'), a15(15, 'A'), a12(12, 'A');
@@ -126,11 +102,11 @@ TEST(Writers, FruStanzas) {
   };
   for (const auto& c : cases) {
     {
-      Capture out;
+      OutputCapture out;
       EXPECT_EQ(dorvex::outputfruSW(c.fru, c.m), c.sw_result) << c.name;
       EXPECT_EQ(out.text(), c.sw_out) << c.name;
     }
-    Capture out;
+    OutputCapture out;
     dorvex::outputfruBPA(c.fru, c.m);
     EXPECT_EQ(out.text(), c.bpa_out) << c.name;
   }
@@ -199,7 +175,7 @@ TEST(Writers, CableLines) {
       {"slot out of range", loc_id_t(0), 0, 16, 0, "*CB \"U7045-SW40C0FFEE-P1-C-T\" \"\"\n"},
   };
   for (const auto& c : cases) {
-    Capture out;
+    OutputCapture out;
     EXPECT_EQ(dorvex::outputCBinfo(db, mtms("7045-SW4", "0C0FFEE"), c.far, c.port, c.fromriser,
                                    c.fromjack),
               0)
