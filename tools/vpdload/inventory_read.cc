@@ -65,7 +65,7 @@ class Reader {
   explicit Reader(Problems* problems) : problems_(problems) {}
 
   void document(const json& doc, Inventory* inv) {
-    if (!object(doc, "inventory", {"sma", "chassis", "bpa"})) return;
+    if (!object(doc, "", {"sma", "chassis", "bpa"})) return;
     readTable(doc, "sma", SMA, &inv->sma);
     readTable(doc, "chassis", CHASSIS, &inv->chassis);
     readTable(doc, "bpa", BPA, &inv->bpa);
@@ -73,7 +73,7 @@ class Reader {
 
  private:
   void problem(const std::string& path, const std::string& what) {
-    problems_->add(path + ": " + what);
+    problems_->add((path.empty() ? "inventory" : path) + ": " + what);
   }
 
   // Reports a value that is not an object, and every key not in `keys`; true when `v` is an
@@ -132,7 +132,8 @@ class Reader {
     } else {
       bool low = value[0] == '-';
       problem(path,
-              value + " does not fit " + std::to_string(r.bits) + " bits, " +
+              value + " does not fit " + std::to_string(r.bits) +
+                  (r.bits == 1 ? " bit, " : " bits, ") +
                   (low ? "at least " + std::to_string(r.min) : "at most " + std::to_string(r.max)));
     }
     return false;

@@ -1,6 +1,7 @@
 // From records back to the inventory's JSON form, leaving out what is empty so that an
 // exported inventory stays readable; reading it back gives the same records.
 #include <cstdint>
+#include <cstdio>
 
 #include "inventory_schema.h"
 #include "text_bytes.h"
@@ -149,14 +150,71 @@ bool oneLine(const ordered_json& v) {
   return true;
 }
 
-std::string dumpPlain(const ordered_json& v) {
-  return v.dump(-1, ' ', false, ordered_json::error_handler_t::strict);
+// A plain value as JSON text, escaped as the library would escape it (texts are UTF-8 by
+// now). Written by hand: going through dump() for every value made large exports slow.
+void appendString(const std::string& s, std::string* out) {
+  *out += '"';
+  for (char c : s) {
+    switch (c) {
+      case '"':
+        *out += "\\\"";
+        break;
+      case '\\':
+        *out += "\\\\";
+        break;
+      case '\b':
+        *out += "\\b";
+        break;
+      case '\f':
+        *out += "\\f";
+        break;
+      case '\n':
+        *out += "\\n";
+        break;
+      case '\r':
+        *out += "\\r";
+        break;
+      case '\t':
+        *out += "\\t";
+        break;
+      default:
+        if (static_cast<unsigned char>(c) < 0x20) {
+          char esc[8];
+          std::snprintf(esc, sizeof esc, "\\u%04x", static_cast<unsigned>(c));
+          *out += esc;
+        } else {
+          *out += c;
+        }
+    }
+  }
+  *out += '"';
+}
+
+void appendPlain(const ordered_json& v, std::string* out) {
+  switch (v.type()) {
+    case ordered_json::value_t::string:
+      appendString(v.get_ref<const std::string&>(), out);
+      break;
+    case ordered_json::value_t::number_integer:
+      *out += std::to_string(v.get<std::int64_t>());
+      break;
+    case ordered_json::value_t::number_unsigned:
+      *out += std::to_string(v.get<std::uint64_t>());
+      break;
+    default:
+      *out += v.dump(-1, ' ', false, ordered_json::error_handler_t::strict);
+  }
+}
+
+void appendKey(const std::string& key, std::string* out) {
+  appendString(key, out);
+  *out += ": ";
 }
 
 // One line: `{"frame": 1, "cage": 2}`.
 void formatInline(const ordered_json& v, std::string* out) {
   if (!v.is_structured() || v.empty()) {
-    *out += dumpPlain(v);
+    appendPlain(v, out);
     return;
   }
   bool obj = v.is_object();
@@ -165,7 +223,7 @@ void formatInline(const ordered_json& v, std::string* out) {
   for (auto it = v.begin(); it != v.end(); ++it) {
     *out += first ? "" : ", ";
     first = false;
-    if (obj) *out += dumpPlain(it.key()) + ": ";
+    if (obj) appendKey(it.key(), out);
     formatInline(*it, out);
   }
   *out += obj ? "}" : "]";
@@ -184,7 +242,7 @@ void format(const ordered_json& v, int indent, std::string* out) {
     *out += first ? "" : ",\n";
     first = false;
     *out += pad;
-    if (obj) *out += dumpPlain(it.key()) + ": ";
+    if (obj) appendKey(it.key(), out);
     format(*it, indent + 2, out);
   }
   *out += "\n" + std::string(static_cast<std::size_t>(indent), ' ') + (obj ? "}" : "]");

@@ -1,6 +1,7 @@
 #include "json_input.h"
 
-#include <set>
+#include <cstdio>
+#include <utility>
 #include <vector>
 
 #include "text_bytes.h"
@@ -8,6 +9,8 @@
 namespace vpdload {
 
 namespace {
+
+using nlohmann::json;
 
 bool plainWord(const std::string& key) {
   if (key.empty()) return false;
@@ -19,33 +22,118 @@ bool plainWord(const std::string& key) {
   return true;
 }
 
-// One open array or object while parsing, to name the place of a problem.
-struct Frame {
-  bool is_array = false;
-  std::size_t index = 0;       // arrays: index of the element being read
-  std::string key;             // objects: key of the member being read
-  std::set<std::string> keys;  // objects: keys seen so far
-};
-
-struct TooDeep {};
-
-std::string framePath(const std::vector<Frame>& frames) {
-  std::string path;
-  for (const Frame& f : frames) {
-    path = f.is_array ? indexPath(path, f.index) : keyPath(path, f.key);
-  }
-  return path;
-}
-
-// Strips the library's "[json.exception.parse_error.101] " tag from a message.
+// The library's message without its "[json.exception.parse_error.101] " tag. It quotes the
+// input near the error, which may hold any bytes: those are written as \xHH.
 std::string parseMessage(const char* what) {
   std::string m = what;
   if (!m.empty() && m[0] == '[') {
     std::size_t close = m.find("] ");
     if (close != std::string::npos) m.erase(0, close + 2);
   }
-  return m;
+  std::string out;
+  for (unsigned char c : m) {
+    if (c >= 0x20 && c < 0x7f) {
+      out += static_cast<char>(c);
+    } else {
+      char hex[8];
+      std::snprintf(hex, sizeof hex, "\\x%02x", c);
+      out += hex;
+    }
+  }
+  return out;
 }
+
+// Builds the document from the parser's events, like the library's own builder, but stops
+// at a key given twice in one object (which the library would resolve silently by keeping
+// the last value) and at nesting deeper than kMaxJsonDepth.
+class StrictBuilder : public nlohmann::json_sax<json> {
+ public:
+  explicit StrictBuilder(json* root) : root_(root) {}
+
+  const std::string& error() const { return error_; }
+
+  bool null() override { return add(nullptr); }
+  bool boolean(bool v) override { return add(v); }
+  bool number_integer(number_integer_t v) override { return add(v); }
+  bool number_unsigned(number_unsigned_t v) override { return add(v); }
+  bool number_float(number_float_t v, const string_t&) override { return add(v); }
+  bool string(string_t& v) override { return add(std::move(v)); }
+  bool binary(binary_t&) override { return fail(": binary values are not JSON"); }
+
+  bool start_object(std::size_t) override { return open(json::object()); }
+  bool key(string_t& k) override {
+    if (open_.back()->contains(k)) return fail(keyPath(path(false), k) + ": key given twice");
+    keys_.back() = std::move(k);
+    return true;
+  }
+  bool end_object() override { return close(); }
+  bool start_array(std::size_t) override { return open(json::array()); }
+  bool end_array() override { return close(); }
+
+  bool parse_error(std::size_t, const std::string&, const nlohmann::detail::exception& e) override {
+    return fail(parseMessage(e.what()));
+  }
+
+ private:
+  // Where the next value goes: the place of the element or member being read. Without
+  // `member`, the place of the innermost open array or object itself.
+  std::string path(bool member = true) const {
+    std::string p;
+    std::size_t levels = open_.size() - (member || open_.empty() ? 0 : 1);
+    for (std::size_t i = 0; i < levels; ++i) {
+      bool inner = i + 1 < open_.size();  // an element of this one is open too
+      if (open_[i]->is_array()) {
+        p = indexPath(p, open_[i]->size() - (inner ? 1 : 0));
+      } else {
+        p = keyPath(p, keys_[i]);
+      }
+    }
+    return p;
+  }
+
+  template <typename Value>
+  bool add(Value&& v) {
+    slot() = json(std::forward<Value>(v));
+    return true;
+  }
+
+  json& slot() {
+    if (open_.empty()) return *root_;
+    json* top = open_.back();
+    if (top->is_array()) {
+      top->emplace_back();
+      return top->back();
+    }
+    return (*top)[keys_.back()];
+  }
+
+  bool open(json empty) {
+    if (open_.size() >= static_cast<std::size_t>(kMaxJsonDepth)) {
+      return fail(path() + ": nested deeper than " + std::to_string(kMaxJsonDepth) + " levels");
+    }
+    json& s = slot();
+    s = std::move(empty);
+    open_.push_back(&s);
+    keys_.emplace_back();
+    return true;
+  }
+
+  bool close() {
+    open_.pop_back();
+    keys_.pop_back();
+    return true;
+  }
+
+  bool fail(std::string message) {
+    if (error_.empty()) error_ = std::move(message);
+    return false;
+  }
+
+  json* root_;
+  std::vector<json*> open_;        // the arrays and objects being read, outermost first
+  std::vector<std::string> keys_;  // for objects: the key of the member being read
+  std::string error_;
+};
 
 }  // namespace
 
@@ -58,55 +146,12 @@ std::string indexPath(const std::string& parent, std::size_t index) {
   return parent + "[" + std::to_string(index) + "]";
 }
 
-bool parseJson(const std::string& text, nlohmann::json* doc, std::string* error) {
-  using nlohmann::json;
-  std::vector<Frame> frames;
-  std::string duplicate;  // first key given twice, as a path
-  // The parser reports each finished element of an array; the index moves on after it.
-  auto elementDone = [&frames]() {
-    if (!frames.empty() && frames.back().is_array) ++frames.back().index;
-  };
-  json::parser_callback_t callback = [&](int depth, json::parse_event_t event, json& parsed) {
-    switch (event) {
-      case json::parse_event_t::object_start:
-      case json::parse_event_t::array_start:
-        if (depth >= kMaxJsonDepth) throw TooDeep();
-        frames.emplace_back();
-        frames.back().is_array = event == json::parse_event_t::array_start;
-        break;
-      case json::parse_event_t::key:
-        if (!frames.empty()) {
-          Frame& f = frames.back();
-          f.key = parsed.get<std::string>();
-          if (!f.keys.insert(f.key).second && duplicate.empty()) duplicate = framePath(frames);
-        }
-        break;
-      case json::parse_event_t::object_end:
-      case json::parse_event_t::array_end:
-        if (!frames.empty()) frames.pop_back();
-        elementDone();
-        break;
-      case json::parse_event_t::value:
-        elementDone();
-        break;
-    }
-    return true;
-  };
-  try {
-    *doc = json::parse(text, callback);
-  } catch (const json::parse_error& e) {
-    *error = parseMessage(e.what());
-    return false;
-  } catch (const TooDeep&) {
-    *error =
-        framePath(frames) + ": nested deeper than " + std::to_string(kMaxJsonDepth) + " levels";
-    return false;
-  }
-  if (!duplicate.empty()) {
-    *error = duplicate + ": key given twice";
-    return false;
-  }
-  return true;
+bool parseJson(const std::string& text, json* doc, std::string* error) {
+  *doc = json();
+  StrictBuilder builder(doc);
+  if (json::sax_parse(text, &builder)) return true;
+  *error = builder.error();
+  return false;
 }
 
 }  // namespace vpdload

@@ -68,7 +68,7 @@ bool fromHex(const std::string& hex, std::string* bytes, std::string* why) {
     }
   }
   if (hex.size() % 2 != 0) {
-    *why = std::to_string(hex.size()) + " hex digits, not an even number";
+    *why = "an odd number of hex digits (" + std::to_string(hex.size()) + ")";
     return false;
   }
   bytes->clear();
