@@ -2,8 +2,9 @@
 #ifndef VPDDB_INCLUDE_VPD_TYPES_H_
 #define VPDDB_INCLUDE_VPD_TYPES_H_
 
-// Device type held in loc_id_t::type. Values 8 to 15 fit the field but have no name.
-enum dev_type_t {
+// Device type held in loc_id_t::type. Values 8 to 15 fit the field but have no name (the
+// fixed underlying type makes them valid values of the enumeration).
+enum dev_type_t : int {
   NSB = 0,
   SMA = 1,  // SMA chip: stored in the SMA table
   ISB = 2,
@@ -14,8 +15,9 @@ enum dev_type_t {
   RISER = 7,
 };
 
-// Names one of the three tables.
-enum table_t {
+// Names one of the three tables. The fixed underlying type makes any int a valid value, so
+// showVPD can be handed a number that names no table and say so.
+enum table_t : int {
   SMA_TABLE = 1,
   CHASSIS_TABLE = 2,
   BPA_TABLE = 3,
