@@ -72,7 +72,7 @@ bool isGeneration(const TwoGenerations& gens, const std::string& table, const st
 
 TEST(VpdloadFaults, ReadersSeeAWholeGenerationOfEveryTableDuringImports) {
   TempDir tmp;
-  TwoGenerations gens(tmp, 4000, 200, 3);
+  TwoGenerations gens(tmp, 2000, 120, 3);
   // One request per table, so that each answer comes from one table file.
   const std::vector<std::vector<std::string>> requests = {
       {"-y", "switch", "-f", "1"},            // every chassis of frame 1
@@ -104,7 +104,7 @@ TEST(VpdloadFaults, ReadersSeeAWholeGenerationOfEveryTableDuringImports) {
   ASSERT_EQ(importText(root + "/data", gens.json[0], gens.file[0]).status, 0);
   std::atomic<bool> writing{true};
   std::thread writer([&] {
-    for (int i = 1; i <= 12; ++i) {
+    for (int i = 1; i <= 10; ++i) {
       RunResult r = vpdload({"import", "--data", root + "/data", gens.file[i % 2]});
       EXPECT_EQ(r.status, 0) << r.err;
     }
