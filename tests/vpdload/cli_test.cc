@@ -65,6 +65,25 @@ TEST(VpdloadCli, AMissingLiveTableLeavesAnOlderOldFileAlone) {
   EXPECT_TRUE(fileExists(data + "/bpa_vpd.db"));
 }
 
+TEST(VpdloadCli, AnImportRemovesTheStagingFoldersOfKilledImports) {
+  TempDir tmp;
+  std::string data = tmp / "data";
+  ASSERT_EQ(importText(data, makeInventory(2, 1, 1, "A"), tmp / "in.json").status, 0);
+  // What a killed import leaves: a staging folder with tables in it.
+  for (const char* name : {".vpdload.k1LLed", ".vpdload.Xy12z9"}) {
+    testsupport::makeDirs(data + "/" + name);
+    writeFile(data + "/" + name + "/sma_vpd.db", std::string(100, 'x'));
+    writeFile(data + "/" + name + "/chassis_vpd.db.old", "");
+  }
+  writeFile(data + "/.vpdload.notes", "not a folder: not ours to remove");
+
+  ASSERT_EQ(importText(data, makeInventory(3, 1, 1, "B"), tmp / "in.json").status, 0);
+  auto left = snapshot(data);
+  EXPECT_EQ(vpdloadtest::stagingLeftovers(data), std::vector<std::string>());
+  EXPECT_EQ(left.count(".vpdload.notes"), 1u);
+  EXPECT_EQ(left.count(".vpdload.lock"), 1u);
+}
+
 TEST(VpdloadCli, FilesStreamsAndTheDefaultDataDirectory) {
   TempDir tmp;
   std::string inv = makeInventory(4, 2, 1, "S");
