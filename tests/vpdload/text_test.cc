@@ -5,6 +5,7 @@
 #include <nlohmann/json.hpp>
 #include <string>
 
+#include "inventory_schema.h"
 #include "text_bytes.h"
 
 namespace {
@@ -74,6 +75,23 @@ TEST(VpdloadText, HexRoundTripAndRejects) {
       EXPECT_TRUE(vpdload::fromHex(vpdload::toHex(bytes), &back, &why));
       EXPECT_EQ(back, c.bytes_or_why);
     }
+  }
+}
+
+// Export builds its text record by record; it must be the layout of the whole document.
+TEST(VpdloadText, ExportTextIsTheFormattedDocument) {
+  const char* cases[] = {
+      "{}",
+      R"({"bpa": [{"loc": {"frame": 1}, "bpr1": [{}, {"pn": "x"}]}]})",
+      R"({"sma": [{"loc": {"chip": 1}, "fru": {"ds": {"hex": "ff"}}}, {"loc": {"chip": 2}}],
+          "chassis": [{"risers": [{"slot": 3, "port1": -1}, {"slot": 4, "fru": {"sn": "s"}}]}],
+          "bpa": [{"timestamp": "t\n"}]})",
+  };
+  for (const char* json : cases) {
+    SCOPED_TRACE(json);
+    vpdload::Inventory inv;
+    ASSERT_TRUE(vpdload::parseInventory(json, &inv).empty());
+    EXPECT_EQ(vpdload::inventoryText(inv), vpdload::formatJson(vpdload::inventoryToJson(inv)));
   }
 }
 

@@ -55,6 +55,10 @@ nlohmann::ordered_json inventoryToJson(const Inventory& inv);
 // values on one line, a final newline.
 std::string formatJson(const nlohmann::ordered_json& doc);
 
+// formatJson(inventoryToJson(inv)), built one record at a time: a large export never holds
+// the whole document as JSON values.
+std::string inventoryText(const Inventory& inv);
+
 // Names of the device types 0 to 7 (NSB ... RISER); "" for a number without a name.
 const char* typeName(unsigned type);
 

@@ -265,4 +265,36 @@ std::string formatJson(const ordered_json& doc) {
   return out;
 }
 
+namespace {
+
+// One table of the document, record by record, laid out as format() lays out the whole.
+template <typename Record>
+void appendTable(const char* key, const std::vector<Record>& records, std::string* out) {
+  *out += "  ";
+  appendKey(key, out);
+  if (records.empty()) {
+    *out += "[]";
+    return;
+  }
+  *out += "[\n";
+  for (std::size_t i = 0; i < records.size(); ++i) {
+    *out += i ? ",\n    " : "    ";
+    format(record(records[i]), 4, out);
+  }
+  *out += "\n  ]";
+}
+
+}  // namespace
+
+std::string inventoryText(const Inventory& inv) {
+  std::string out = "{\n";
+  appendTable("sma", inv.sma, &out);
+  out += ",\n";
+  appendTable("chassis", inv.chassis, &out);
+  out += ",\n";
+  appendTable("bpa", inv.bpa, &out);
+  out += "\n}\n";
+  return out;
+}
+
 }  // namespace vpdload

@@ -123,7 +123,7 @@ ExitStatus runExport(const Options& o, const std::string& data_dir) {
   Status s = exportTables(data_dir, o.wait_seconds, &inv, &warnings);
   if (!s.ok()) return fail(s);
   for (const std::string& w : warnings) say("warning: " + w);
-  s = writeAll(o.file, formatJson(inventoryToJson(inv)));
+  s = writeAll(o.file, inventoryText(inv));
   return s.ok() ? ExitStatus::kDone : fail(s);
 }
 
