@@ -25,8 +25,9 @@ Status DataLock::lockForImport(const std::string& data_dir, double wait_seconds)
   std::string path = joinPath(data_dir, kLockFile);
   fd_ = ::open(path.c_str(), O_RDWR | O_CREAT | O_CLOEXEC, 0664);
   if (fd_ < 0) {
+    const int err = errno;
     return Status::Fail(Outcome::kCannotWrite,
-                        "cannot create the lock file " + path + ": " + errnoText(errno));
+                        "cannot create the lock file " + path + ": " + errnoText(err));
   }
   return waitFor(LOCK_EX, path, wait_seconds);
 }
@@ -47,7 +48,8 @@ Status DataLock::waitFor(int operation, const std::string& path, double wait_sec
     if (::flock(fd_, operation | LOCK_NB) == 0) return Status::Ok();
     if (errno == EINTR) continue;
     if (errno != EWOULDBLOCK) {
-      return Status::Fail(Outcome::kCannotWrite, "cannot lock " + path + ": " + errnoText(errno));
+      const int err = errno;
+      return Status::Fail(Outcome::kCannotWrite, "cannot lock " + path + ": " + errnoText(err));
     }
     auto now = Clock::now();
     if (now >= deadline) break;

@@ -45,10 +45,18 @@ ExitStatus fail(const Status& s) {
 bool isStdio(const std::string& file) { return file.empty() || file == "-"; }
 std::string displayName(const std::string& file) { return isStdio(file) ? "standard input" : file; }
 
+// errno is taken by the caller right after the call that failed: building the message may
+// change it.
+Status ioFailure(Outcome o, const std::string& what, int err) {
+  return Status::Fail(o, what + ": " + errnoText(err));
+}
+
 Status readAll(const std::string& file, std::string* text) {
   int fd = isStdio(file) ? 0 : ::open(file.c_str(), O_RDONLY | O_CLOEXEC);
-  if (fd < 0)
-    return Status::Fail(Outcome::kCannotRead, "cannot read " + file + ": " + errnoText(errno));
+  if (fd < 0) {
+    const int err = errno;
+    return ioFailure(Outcome::kCannotRead, "cannot read " + file, err);
+  }
   char buf[65536];
   Status s;
   for (;;) {
@@ -58,8 +66,8 @@ Status readAll(const std::string& file, std::string* text) {
     } else if (n == 0) {
       break;
     } else if (errno != EINTR) {
-      s = Status::Fail(Outcome::kCannotRead,
-                       "cannot read " + displayName(file) + ": " + errnoText(errno));
+      const int err = errno;
+      s = ioFailure(Outcome::kCannotRead, "cannot read " + displayName(file), err);
       break;
     }
   }
@@ -68,10 +76,12 @@ Status readAll(const std::string& file, std::string* text) {
 }
 
 Status writeAll(const std::string& file, const std::string& text) {
+  const std::string name = isStdio(file) ? "standard output" : file;
   int fd = isStdio(file) ? 1 : ::open(file.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, 0644);
-  std::string name = isStdio(file) ? "standard output" : file;
-  if (fd < 0)
-    return Status::Fail(Outcome::kCannotWrite, "cannot create " + name + ": " + errnoText(errno));
+  if (fd < 0) {
+    const int err = errno;
+    return ioFailure(Outcome::kCannotWrite, "cannot create " + name, err);
+  }
   std::size_t done = 0;
   Status s;
   while (done < text.size()) {
@@ -81,12 +91,14 @@ Status writeAll(const std::string& file, const std::string& text) {
     } else if (n < 0 && errno == EINTR) {
       continue;
     } else {
-      s = Status::Fail(Outcome::kCannotWrite, "cannot write " + name + ": " + errnoText(errno));
+      const int err = n < 0 ? errno : ENOSPC;  // a write of nothing: no room left
+      s = ioFailure(Outcome::kCannotWrite, "cannot write " + name, err);
       break;
     }
   }
   if (fd != 1 && ::close(fd) != 0 && s.ok()) {
-    s = Status::Fail(Outcome::kCannotWrite, "cannot write " + name + ": " + errnoText(errno));
+    const int err = errno;
+    s = ioFailure(Outcome::kCannotWrite, "cannot write " + name, err);
   }
   return s;
 }

@@ -18,7 +18,8 @@ Status readTable(const std::string& data_dir, const TableFile& table, std::vecto
   std::string path = joinPath(data_dir, table.file);
   std::ifstream in(path, std::ios::binary);
   if (!in) {
-    return Status::Fail(Outcome::kCannotRead, "cannot read " + path + ": " + errnoText(errno));
+    const int err = errno;
+    return Status::Fail(Outcome::kCannotRead, "cannot read " + path + ": " + errnoText(err));
   }
   char buf[Record::kRecordSize];
   for (;;) {
@@ -30,7 +31,8 @@ Status readTable(const std::string& data_dir, const TableFile& table, std::vecto
       continue;
     }
     if (in.bad()) {
-      return Status::Fail(Outcome::kCannotRead, "cannot read " + path + ": " + errnoText(errno));
+      const int err = errno;
+      return Status::Fail(Outcome::kCannotRead, "cannot read " + path + ": " + errnoText(err));
     }
     if (got > 0) {
       warnings->push_back(path + " ends with " + std::to_string(got) +

@@ -27,11 +27,15 @@ Status makeDataDir(const std::string& dir) {
     if (pos != dir.size() && dir[pos] != '/') continue;
     std::string part = dir.substr(0, pos);
     if (::mkdir(part.c_str(), 0755) != 0 && errno != EEXIST) {
-      return cannotWrite("cannot create the data directory " + part, errno);
+      const int err = errno;
+      return cannotWrite("cannot create the data directory " + part, err);
     }
   }
   struct stat st;
-  if (::stat(dir.c_str(), &st) != 0) return cannotWrite("cannot use " + dir, errno);
+  if (::stat(dir.c_str(), &st) != 0) {
+    const int err = errno;
+    return cannotWrite("cannot use " + dir, err);
+  }
   if (!S_ISDIR(st.st_mode)) return cannotWrite("cannot use " + dir, ENOTDIR);
   return Status::Ok();
 }
@@ -80,7 +84,8 @@ class Staging {
     std::vector<char> buf(templ.begin(), templ.end());
     buf.push_back('\0');
     if (::mkdtemp(buf.data()) == nullptr) {
-      return cannotWrite("cannot create a staging folder in " + data_dir, errno);
+      const int err = errno;
+      return cannotWrite("cannot create a staging folder in " + data_dir, err);
     }
     path_ = buf.data();
     return Status::Ok();
@@ -102,9 +107,10 @@ Status storeAll(vpdDB& db, const std::vector<Record>& records, const TableFile& 
     Record copy(records[i]);
     errno = 0;
     if (db.putVPD(copy.loc_id, &copy) != 0) {
+      const int err = errno;  // the database keeps the errno of the failed write
       return cannotWrite("cannot write " + std::string(table.key) + "[" + std::to_string(i) +
                              "] to " + stage.file(table.file),
-                         errno);
+                         err);
     }
   }
   return Status::Ok();
@@ -115,17 +121,22 @@ Status storeAll(vpdDB& db, const std::vector<Record>& records, const TableFile& 
 // the rename could leave an empty live table.
 Status syncStaged(const std::string& path, std::size_t expected_size) {
   int fd = ::open(path.c_str(), O_RDONLY | O_CLOEXEC);
-  if (fd < 0) return cannotWrite("cannot open " + path, errno);
+  if (fd < 0) {
+    const int err = errno;
+    return cannotWrite("cannot open " + path, err);
+  }
   struct stat st;
   Status status;
   if (::fstat(fd, &st) != 0) {
-    status = cannotWrite("cannot read the status of " + path, errno);
+    const int err = errno;
+    status = cannotWrite("cannot read the status of " + path, err);
   } else if (static_cast<std::size_t>(st.st_size) != expected_size) {
     status = cannotWrite(path + " holds " + std::to_string(st.st_size) + " bytes instead of " +
                              std::to_string(expected_size),
                          0);
   } else if (::fsync(fd) != 0) {
-    status = cannotWrite("cannot sync " + path, errno);
+    const int err = errno;
+    status = cannotWrite("cannot sync " + path, err);
   }
   ::close(fd);
   return status;
@@ -139,7 +150,8 @@ Status writeStaged(const Inventory& inv, const Staging& stage) {
     if (s.ok()) s = storeAll(db, inv.sma, kSmaTable, stage);
     if (!s.ok()) return s;
   } catch (int) {
-    return cannotWrite("cannot create the new tables in " + stage.path(), errno);
+    const int err = errno;
+    return cannotWrite("cannot create the new tables in " + stage.path(), err);
   }
   const std::size_t counts[] = {inv.chassis.size(), inv.bpa.size(), inv.sma.size()};
   for (int t = 0; t < 3; ++t) {
@@ -151,9 +163,15 @@ Status writeStaged(const Inventory& inv, const Staging& stage) {
 
 Status syncDirectory(const std::string& dir) {
   int fd = ::open(dir.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
-  if (fd < 0) return cannotWrite("cannot open " + dir + " to sync it", errno);
+  if (fd < 0) {
+    const int err = errno;
+    return cannotWrite("cannot open " + dir + " to sync it", err);
+  }
   Status status;
-  if (::fsync(fd) != 0) status = cannotWrite("cannot sync " + dir, errno);
+  if (::fsync(fd) != 0) {
+    const int err = errno;
+    status = cannotWrite("cannot sync " + dir, err);
+  }
   ::close(fd);
   return status;
 }
@@ -168,8 +186,9 @@ Status commit(const Staging& stage, const std::string& data_dir) {
     std::string prev = stage.file(std::string(kTables[t]->file) + ZRV_OLD_SUFFIX);
     had_live[t] = ::link(live.c_str(), prev.c_str()) == 0;
     // Without a live table, the read-write constructor leaves an older ".old" alone too.
-    if (!had_live[t] && errno != ENOENT) {
-      return cannotWrite("cannot keep the previous " + live, errno);
+    const int err = had_live[t] ? 0 : errno;
+    if (!had_live[t] && err != ENOENT) {
+      return cannotWrite("cannot keep the previous " + live, err);
     }
   }
   // A change poll compares the SMA table's time with the time of its last answer; the new
@@ -182,10 +201,12 @@ Status commit(const Staging& stage, const std::string& data_dir) {
     std::string prev = stage.file(std::string(kTables[t]->file) + ZRV_OLD_SUFFIX);
     std::string already = done.empty() ? "" : " (already replaced:" + done + ")";
     if (had_live[t] && ::rename(prev.c_str(), old.c_str()) != 0) {
-      return cannotWrite("cannot rename " + prev + " to " + old + already, errno);
+      const int err = errno;
+      return cannotWrite("cannot rename " + prev + " to " + old + already, err);
     }
     if (::rename(stage.file(kTables[t]->file).c_str(), live.c_str()) != 0) {
-      return cannotWrite("cannot rename the new table to " + live + already, errno);
+      const int err = errno;
+      return cannotWrite("cannot rename the new table to " + live + already, err);
     }
     done += std::string(" ") + kTables[t]->file;
   }
