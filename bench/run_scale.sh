@@ -8,8 +8,8 @@
 # scale (scale 64: 1024 switch chassis on one network, 4096 CECs with 8 SMA records each,
 # 256 frames, about 8 MB of tables), and for each request prints the fastest wall time and
 # the mean CPU time of the request and of its floor, their ratio, the growth from the
-# previous size and the peak memory. Takes about three minutes on two cores. Needs
-# hyperfine, /usr/bin/time and python3.
+# previous size and the peak memory. Takes a few minutes (five and a half on two busy cores).
+# Needs hyperfine, /usr/bin/time and python3.
 #
 # The targets are checked on CPU time (user + system of the process and its children, which
 # is what a request costs whatever else the machine runs); --wall checks the fastest wall
