@@ -3,8 +3,8 @@
 # build-fuzz/ and runs each for SECONDS on a copy of its committed corpus. Fails when a
 # target crashes, leaks, times out, runs out of memory or a sanitizer reports anything.
 #   tests/fuzz/run_fuzzers.sh SECONDS [TARGET...]      (default: every target)
-# New inputs found on the way stay in the work folder (printed at the end); the committed
-# corpus is not changed.
+# The committed corpus is not changed. The work folder (new inputs, logs, crash inputs) is
+# kept when a target fails and removed otherwise.
 set -euo pipefail
 seconds=${1:?usage: run_fuzzers.sh SECONDS [TARGET...]}
 shift
@@ -41,9 +41,9 @@ for t in "${targets[@]}"; do
     grep -E 'stat::(number_of_executed_units|average_exec_per_sec)' "$log" || true
   fi
 done
-echo "work folder: $work"
 if [ ${#failed[@]} -ne 0 ]; then
-  echo "failed: ${failed[*]}"
+  echo "failed: ${failed[*]}; logs and inputs in $work"
   exit 1
 fi
+rm -rf "$work"
 echo "all fuzz targets ran ${seconds}s without a finding"
