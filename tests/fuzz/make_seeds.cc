@@ -1,11 +1,14 @@
 // Writes the seed corpora of the fuzz targets into CORPUS_DIR/<target>/ from the sample
-// installation: small, valid examples of every input, plus a few near misses.
-//   fuzz_make_seeds CORPUS_DIR
+// installation: small, valid examples of every input, plus a few near misses; with
+// EXAMPLES_DIR also from the example installation's files (examples/ of the source tree).
+//   fuzz_make_seeds CORPUS_DIR [EXAMPLES_DIR]
 #include <sys/stat.h>
 
 #include <cstdint>
 #include <cstdio>
 #include <cstring>
+#include <fstream>
+#include <iterator>
 #include <string>
 #include <vector>
 
@@ -129,11 +132,41 @@ void argsSeeds() {
       std::string("-ycecabc\0-f\0 12x\0-c\0-0\0-r\0bpcx\0-h\0+1\0-p\0009\0", 42));
 }
 
+bool readFile(const std::string& path, std::string* text) {
+  std::ifstream in(path, std::ios::binary);
+  if (!in) return false;
+  text->assign(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
+  return true;
+}
+
+// The example installation: its configuration, its dump listing, its inventory and the
+// tables that the inventory makes.
+void exampleSeeds(const std::string& dir) {
+  std::string text;
+  if (readFile(dir + "/hwserver.json", &text)) put("hwserver", "example", text);
+  if (readFile(dir + "/rackprobe.dump", &text)) {
+    put("chiplist", "example-net1", chiplistInput(1, 0, text));
+    put("chiplist", "example-net2", chiplistInput(2, 64, text));
+  }
+  if (!readFile(dir + "/installation.json", &text)) return;
+  put("inventory", "example", text);
+  vpdload::Inventory inv;
+  if (!vpdload::parseInventory(text, &inv).empty()) {
+    std::fprintf(stderr, "%s/installation.json is not a valid inventory\n", dir.c_str());
+    std::exit(1);
+  }
+  const smaVPD& first_sma = inv.sma.empty() ? smaVPD() : inv.sma.front();
+  put("tables", "example",
+      tablesInput(0x40, sample::tableBytes(inv.chassis), sample::tableBytes(inv.bpa),
+                  sample::tableBytes(inv.sma), first_sma.loc_id.getFrame(),
+                  first_sma.loc_id.getCage(), 1, 1, first_sma.cec_mtms, 5));
+}
+
 }  // namespace
 
 int main(int argc, char** argv) {
-  if (argc != 2) {
-    std::fprintf(stderr, "usage: %s CORPUS_DIR\n", argv[0]);
+  if (argc != 2 && argc != 3) {
+    std::fprintf(stderr, "usage: %s CORPUS_DIR [EXAMPLES_DIR]\n", argv[0]);
     return 2;
   }
   corpus = argv[1];
@@ -143,5 +176,6 @@ int main(int argc, char** argv) {
   hwserverSeeds();
   inventorySeeds();
   argsSeeds();
+  if (argc == 3) exampleSeeds(argv[2]);
   return 0;
 }
