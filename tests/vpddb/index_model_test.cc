@@ -3,6 +3,7 @@
 #include <cstring>
 #include <random>
 
+#include "table_io.h"
 #include "vpd_test_util.h"
 
 namespace {
@@ -53,9 +54,27 @@ std::vector<std::string> keys(const std::list<T>& l) {
   return out;
 }
 
-class IndexModelTest : public vpdtest::VpdTest {};
+void* noMap(int, size_t) { return nullptr; }
 
-TEST_F(IndexModelTest, IndexedLookupsAgreeWithAPlainScan) {
+// Tables are mapped where the file allows it and read into memory otherwise: both must give
+// the same answers.
+class IndexModelTest : public vpdtest::VpdTest, public ::testing::WithParamInterface<bool> {
+ protected:
+  void SetUp() override {
+    vpdtest::VpdTest::SetUp();
+    saved_ = vpd::fileOps();
+    if (!GetParam()) vpd::fileOps().map = noMap;
+  }
+  void TearDown() override {
+    vpd::fileOps() = saved_;
+    vpdtest::VpdTest::TearDown();
+  }
+  vpd::FileOps saved_;
+};
+
+INSTANTIATE_TEST_SUITE_P(MappedOrRead, IndexModelTest, ::testing::Bool());
+
+TEST_P(IndexModelTest, IndexedLookupsAgreeWithAPlainScan) {
   for (unsigned seed = 1; seed <= 6; ++seed) {
     std::mt19937 rng(seed);
     std::string sma = generate<smaVPD>(rng, 200, SMA);
@@ -187,7 +206,7 @@ TEST_F(IndexModelTest, IndexedLookupsAgreeWithAPlainScan) {
 
 // The store against a std::map model: write N records with repeated keys, then check the
 // table holds exactly the model's records in first-insertion order.
-TEST_F(IndexModelTest, StoreAgreesWithAMapModel) {
+TEST_P(IndexModelTest, StoreAgreesWithAMapModel) {
   std::mt19937 rng(42);
   std::uniform_int_distribution<unsigned> small(0, 6), chip(0, 15);
   vpdDB db(dataDir());

@@ -54,6 +54,29 @@ TEST_F(LifecycleTest, ReadWriteConstructorStartsANewGeneration) {
   EXPECT_TRUE(takeTraces().empty());
 }
 
+int failRename(const char*, const char*) {
+  errno = EACCES;
+  return -1;
+}
+
+TEST_F(LifecycleTest, TableThatCannotBeMovedAsideIsNeverEmptied) {
+  writeTables("chassis bytes", "bpa bytes", "sma bytes");
+  vpd::FileOps saved = vpd::fileOps();
+  vpd::fileOps().rename = failRename;
+  int thrown = 0;
+  try {
+    vpdDB db(dataDir());
+  } catch (int e) {
+    thrown = e;
+  }
+  vpd::fileOps() = saved;
+  EXPECT_EQ(thrown, 1);
+  EXPECT_EQ(readFile(table("chassis_vpd.db")), "chassis bytes");
+  EXPECT_EQ(readFile(table("bpa_vpd.db")), "bpa bytes");
+  EXPECT_EQ(readFile(table("sma_vpd.db")), "sma bytes");
+  EXPECT_EQ(takeTraces(), std::vector<std::string>{"64|vpdDB|Failed to open the chassisTbl"});
+}
+
 TEST_F(LifecycleTest, ReadOnlyConstructorChangesNothing) {
   writeTables("c", "b", "s");
   for (int arg : {0, 1, -7}) {

@@ -30,7 +30,8 @@ class vpdDB {
  public:
   // Read-write constructor for the producer: moves each existing table file to the same
   // path with ".old" appended and starts the table empty (created 0664 less umask).
-  // Throws the int 1 (after a level-64 trace) when a table cannot be opened.
+  // Throws the int 1 (after a level-64 trace) when a table cannot be opened, or when an
+  // existing table could not be moved aside (it is left as it was).
   vpdDB();
   // Read-only constructor: opens the three existing tables for reading; the argument has
   // no effect. Throws the int 1 (after a level-64 trace) when a table cannot be opened;
@@ -86,7 +87,8 @@ class vpdDB {
   static std::string defaultDataDir();
 
  private:
-  // Moves table_name to table_name + ".old" if it can be opened for reading.
+  // Moves table_name, if it exists, to table_name + ".old". Returns 0, or -1 when the table
+  // exists and could not be moved (the constructor then refuses to start it empty).
   int renameFiles(const char* table_name);
   void openTables(bool read_write);
 

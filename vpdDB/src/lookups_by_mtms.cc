@@ -11,18 +11,13 @@ bool any(const Record&) {
   return true;
 }
 
-// The index hands back at most one record: the first with that MTMS.
-vpd::RecordList firstWithMtms(vpd::Table& t, const mtms& key) {
-  long n = t.index().firstByMtms(key);
-  return n < 0 ? vpd::RecordList{} : vpd::RecordList{static_cast<uint32_t>(n)};
-}
-
 }  // namespace
 
 int vpdDB::getBPAvpd(mtms frame_mtms, bpaVPD& bpa_vpd) {
   vpd::Table& t = tables_->bpaTbl;
-  vpd::ScanOutcome o = vpd::scanTable<bpaVPD>(t, firstWithMtms(t, frame_mtms), vpd::Take::kFirst,
-                                              any<bpaVPD>, [&](const bpaVPD& r) { bpa_vpd = r; });
+  vpd::ScanOutcome o =
+      vpd::scanTable<bpaVPD>(t, t.index().firstByMtms(frame_mtms), vpd::Take::kFirst, any<bpaVPD>,
+                             [&](const bpaVPD& r) { bpa_vpd = r; });
   return vpd::lookupResult(o, "getBPAvpd", "The bpa table is empty", [] {
     VPD_TRACE(ZRV_TRACE_INFO, "getBPAvpd", loc_id_t(0),
               "The specified mtms is not find in the bpaTbl");
@@ -32,8 +27,8 @@ int vpdDB::getBPAvpd(mtms frame_mtms, bpaVPD& bpa_vpd) {
 int vpdDB::getSwitchvpd(mtms sw_mtms, chassisVPD& switch_vpd) {
   vpd::Table& t = tables_->chassisTbl;
   vpd::ScanOutcome o =
-      vpd::scanTable<chassisVPD>(t, firstWithMtms(t, sw_mtms), vpd::Take::kFirst, any<chassisVPD>,
-                                 [&](const chassisVPD& r) { switch_vpd = r; });
+      vpd::scanTable<chassisVPD>(t, t.index().firstByMtms(sw_mtms), vpd::Take::kFirst,
+                                 any<chassisVPD>, [&](const chassisVPD& r) { switch_vpd = r; });
   return vpd::lookupResult(o, "getSwitchvpd", "The switch chassis table is empty ", [] {
     VPD_TRACE(ZRV_TRACE_INFO, "getSwitchvpd", loc_id_t(0),
               "The specified switch mtms not find in the chassisTable");

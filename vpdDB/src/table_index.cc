@@ -1,6 +1,8 @@
 #include "table_index.h"
 
+#include <algorithm>
 #include <cstring>
+#include <unordered_set>
 
 namespace vpd {
 namespace {
@@ -9,54 +11,49 @@ constexpr unsigned int kMaxFrame = (1u << loc_id_t::kFrameWidth) - 1;
 constexpr unsigned int kMaxCage = (1u << loc_id_t::kUidWidth) - 1;
 constexpr unsigned int kNetworks = 1u << loc_id_t::kNetworkWidth;
 
-uint32_t frameCageKey(unsigned int frame, unsigned int cage) { return (frame << 8) | cage; }
+uint32_t frameCageKey(loc_id_t l) { return (l.getFrame() << 8) | l.getCage(); }
+uint64_t entry(uint32_t key, std::size_t record) { return uint64_t{key} << 32 | record; }
+
+RecordRange rangeOf(const std::vector<uint64_t>& v) {
+  return RecordRange{v.data(), v.data() + v.size()};
+}
 
 }  // namespace
 
-void TableIndex::buildFrameCage() {
-  frame_cage_built_ = true;
-  for (std::size_t i = 0; i < snapshot_.count(); ++i) {
-    loc_id_t loc = snapshot_.location(i);
-    RecordList& list = frame_cage_[frameCageKey(loc.getFrame(), loc.getCage())];
-    if (list.empty()) first_of_frame_cage_.push_back(static_cast<uint32_t>(i));
-    list.push_back(static_cast<uint32_t>(i));
-  }
-}
-
-const RecordList& TableIndex::byFrameCage(unsigned int frame, unsigned int cage) {
-  if (frame > kMaxFrame || cage > kMaxCage) return empty_;
-  if (!frame_cage_built_) buildFrameCage();
-  auto it = frame_cage_.find(frameCageKey(frame, cage));
-  return it == frame_cage_.end() ? empty_ : it->second;
-}
-
-const RecordList& TableIndex::firstOfEachFrameCage() {
-  if (!frame_cage_built_) buildFrameCage();
-  return first_of_frame_cage_;
-}
-
-const RecordList& TableIndex::byFrame(unsigned int frame) {
-  if (frame > kMaxFrame) return empty_;
-  if (!frame_built_) {
-    frame_built_ = true;
-    for (std::size_t i = 0; i < snapshot_.count(); ++i) {
-      frame_[snapshot_.location(i).getFrame()].push_back(static_cast<uint32_t>(i));
+template <class KeyOf>
+RecordRange TableIndex::lookup(Grouping& g, uint32_t key, KeyOf key_of) {
+  const std::size_t n = snapshot_.count();
+  if (g.sorted.empty() && g.uses++ == 0) {
+    scratch_.clear();
+    for (std::size_t i = 0; i < n; ++i) {
+      if (key_of(snapshot_.location(i)) == key) scratch_.push_back(entry(key, i));
     }
+    return rangeOf(scratch_);
   }
-  auto it = frame_.find(frame);
-  return it == frame_.end() ? empty_ : it->second;
+  if (g.sorted.empty()) {
+    g.sorted.reserve(n);
+    for (std::size_t i = 0; i < n; ++i) g.sorted.push_back(entry(key_of(snapshot_.location(i)), i));
+    std::sort(g.sorted.begin(), g.sorted.end());
+  }
+  auto lo = std::lower_bound(g.sorted.begin(), g.sorted.end(), entry(key, 0));
+  auto hi = std::upper_bound(lo, g.sorted.end(), entry(key, 0xffffffffu));
+  return RecordRange{g.sorted.data() + (lo - g.sorted.begin()),
+                     g.sorted.data() + (hi - g.sorted.begin())};
 }
 
-const RecordList& TableIndex::byNetwork(unsigned int network) {
-  if (network >= kNetworks) return empty_;
-  if (!network_built_) {
-    network_built_ = true;
-    network_.resize(kNetworks);
-    for (std::size_t i = 0; i < snapshot_.count(); ++i) {
-      network_[snapshot_.location(i).getNetwork()].push_back(static_cast<uint32_t>(i));
-    }
-  }
-  return network_[network];
+RecordRange TableIndex::byFrameCage(unsigned int frame, unsigned int cage) {
+  if (frame > kMaxFrame || cage > kMaxCage) return RecordRange{};
+  return lookup(frame_cage_, (frame << 8) | cage, frameCageKey);
+}
+
+RecordRange TableIndex::byFrame(unsigned int frame) {
+  if (frame > kMaxFrame) return RecordRange{};
+  return lookup(frame_, frame, [](loc_id_t l) { return l.getFrame(); });
+}
+
+RecordRange TableIndex::byNetwork(unsigned int network) {
+  if (network >= kNetworks) return RecordRange{};
+  return lookup(network_, network, [](loc_id_t l) { return l.getNetwork(); });
 }
 
 // Two MTMS are equal when their type-models agree as strncmp over 8 characters and their
@@ -66,17 +63,42 @@ std::string TableIndex::mtmsKey(const mtms& m) {
   return vpd::fieldText(m.tm, mtms::kTmChars) + '\0' + vpd::fieldText(m.se, mtms::kSeChars);
 }
 
-long TableIndex::firstByMtms(const mtms& key) {
-  if (!mtms_built_) {
-    mtms_built_ = true;
-    for (std::size_t i = 0; i < snapshot_.count(); ++i) {
-      mtms m;
-      std::memcpy(static_cast<void*>(&m), snapshot_.record(i) + desc_.mtms_offset, sizeof m);
-      mtms_.emplace(mtmsKey(m), static_cast<uint32_t>(i));  // keeps the first
+mtms TableIndex::recordMtms(std::size_t i) const {
+  mtms m;
+  std::memcpy(static_cast<void*>(&m), snapshot_.record(i) + desc_.mtms_offset, sizeof m);
+  return m;
+}
+
+RecordRange TableIndex::firstByMtms(const mtms& key) {
+  scratch_.clear();
+  const std::size_t n = snapshot_.count();
+  if (mtms_uses_++ == 0) {
+    for (std::size_t i = 0; i < n; ++i) {
+      if (recordMtms(i) == key) {
+        scratch_.push_back(entry(0, i));
+        break;
+      }
+    }
+    return rangeOf(scratch_);
+  }
+  if (first_by_mtms_.empty()) {
+    for (std::size_t i = 0; i < n; ++i) {
+      first_by_mtms_.emplace(mtmsKey(recordMtms(i)), static_cast<uint32_t>(i));  // keeps the first
     }
   }
-  auto it = mtms_.find(mtmsKey(key));
-  return it == mtms_.end() ? -1 : static_cast<long>(it->second);
+  auto it = first_by_mtms_.find(mtmsKey(key));
+  if (it != first_by_mtms_.end()) scratch_.push_back(entry(0, it->second));
+  return rangeOf(scratch_);
+}
+
+RecordRange TableIndex::firstOfEachFrameCage() {
+  scratch_.clear();
+  std::unordered_set<uint32_t> seen;
+  for (std::size_t i = 0; i < snapshot_.count(); ++i) {
+    uint32_t key = frameCageKey(snapshot_.location(i));
+    if (seen.insert(key).second) scratch_.push_back(entry(key, i));
+  }
+  return rangeOf(scratch_);
 }
 
 }  // namespace vpd

@@ -1,10 +1,13 @@
-// Indexes over a table snapshot, each built the first time a lookup needs it. Every list of
-// record numbers is in table order, so the first entry is the first match of a scan.
+// Which records a lookup needs to look at, in table order.
+//
+// Each way of grouping the records (by frame and cage, by frame, by network, by MTMS) is
+// built the second time a lookup needs it; the first time is answered by one plain pass over
+// the record locations. A request that asks one question therefore builds nothing, and one
+// that asks many pays for each grouping once.
 #ifndef VPDDB_SRC_TABLE_INDEX_H_
 #define VPDDB_SRC_TABLE_INDEX_H_
 
 #include <cstdint>
-#include <memory>
 #include <string>
 #include <unordered_map>
 #include <vector>
@@ -14,7 +17,17 @@
 
 namespace vpd {
 
-using RecordList = std::vector<uint32_t>;
+// Entries are (key << 32 | record number); the record number is the low half.
+inline uint32_t recordOf(uint64_t entry) { return static_cast<uint32_t>(entry); }
+
+// A run of entries, in table order.
+struct RecordRange {
+  const uint64_t* first = nullptr;
+  const uint64_t* last = nullptr;
+  const uint64_t* begin() const { return first; }
+  const uint64_t* end() const { return last; }
+  bool empty() const { return first == last; }
+};
 
 class TableIndex {
  public:
@@ -23,34 +36,31 @@ class TableIndex {
 
   // Records whose location has this frame and cage. Arguments beyond the fields' ranges
   // match nothing.
-  const RecordList& byFrameCage(unsigned int frame, unsigned int cage);
-  // The distinct (frame, cage) pairs, each as its first record, in order of first occurrence.
-  const RecordList& firstOfEachFrameCage();
-  const RecordList& byFrame(unsigned int frame);
-  const RecordList& byNetwork(unsigned int network);
-  // The first record whose own MTMS equals the argument, or -1.
-  long firstByMtms(const mtms& key);
+  RecordRange byFrameCage(unsigned int frame, unsigned int cage);
+  RecordRange byFrame(unsigned int frame);
+  RecordRange byNetwork(unsigned int network);
+  // The first record whose own MTMS equals the argument (empty range when none).
+  RecordRange firstByMtms(const mtms& key);
+  // The first record of each distinct (frame, cage), in order of first occurrence.
+  RecordRange firstOfEachFrameCage();
 
  private:
-  void buildFrameCage();
+  struct Grouping {
+    int uses = 0;
+    std::vector<uint64_t> sorted;  // by key, then record number
+  };
+  template <class KeyOf>
+  RecordRange lookup(Grouping& g, uint32_t key, KeyOf key_of);
   static std::string mtmsKey(const mtms& m);
+  mtms recordMtms(std::size_t i) const;
 
   const TableSnapshot& snapshot_;
   const TableDesc& desc_;
-  const RecordList empty_;
+  std::vector<uint64_t> scratch_;  // answer of the latest plain pass
 
-  bool frame_cage_built_ = false;
-  std::unordered_map<uint32_t, RecordList> frame_cage_;
-  RecordList first_of_frame_cage_;
-
-  bool frame_built_ = false;
-  std::unordered_map<uint32_t, RecordList> frame_;
-
-  bool network_built_ = false;
-  std::vector<RecordList> network_;
-
-  bool mtms_built_ = false;
-  std::unordered_map<std::string, uint32_t> mtms_;
+  Grouping frame_cage_, frame_, network_;
+  int mtms_uses_ = 0;
+  std::unordered_map<std::string, uint32_t> first_by_mtms_;
 };
 
 }  // namespace vpd

@@ -1,6 +1,7 @@
 #include "table_io.h"
 
 #include <fcntl.h>
+#include <sys/mman.h>
 #include <unistd.h>
 
 #include <cerrno>
@@ -11,13 +12,18 @@ namespace {
 
 int posixOpen(const char* path, int flags, mode_t mode) { return ::open(path, flags, mode); }
 int posixStat(const char* path, struct stat* st) { return ::stat(path, st); }
+void* posixMap(int fd, size_t length) {
+  void* p = ::mmap(nullptr, length, PROT_READ, MAP_PRIVATE | MAP_POPULATE, fd, 0);
+  return p == MAP_FAILED ? nullptr : p;
+}
 
 unsigned long open_count = 0;
 
 }  // namespace
 
 const FileOps& posixFileOps() {
-  static const FileOps ops = {posixOpen, ::pread, ::pwrite, ::fstat, posixStat, ::rename, ::close};
+  static const FileOps ops = {posixOpen, ::pread, ::pwrite, ::fstat, posixStat,
+                              ::rename,  ::close, posixMap, ::munmap};
   return ops;
 }
 

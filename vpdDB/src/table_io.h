@@ -18,6 +18,9 @@ struct FileOps {
   int (*stat)(const char* path, struct stat* st);
   int (*rename)(const char* from, const char* to);
   int (*close)(int fd);
+  // Maps length bytes of the file read-only, all pages present; null when it cannot.
+  void* (*map)(int fd, size_t length);
+  int (*unmap)(void* address, size_t length);
 };
 
 // The operations in use; tests may replace entries and must restore them.

@@ -2,6 +2,7 @@
 #include <fcntl.h>
 #include <sys/stat.h>
 
+#include <cerrno>
 #include <string>
 
 #include "olv_root.h"
@@ -27,7 +28,7 @@ vpdDB::vpdDB(const std::string& data_dir) : tables_(std::make_unique<vpd::Tables
   vpd::loadHostname();
   for (vpd::Table* t : {&tables_->chassisTbl, &tables_->bpaTbl, &tables_->smaTbl}) {
     t->path = data_dir + "/" + t->desc.file_name;
-    renameFiles(t->path.c_str());
+    t->kept_previous = renameFiles(t->path.c_str()) == 0;
   }
   openTables(true);
 }
@@ -46,7 +47,11 @@ vpdDB::vpdDB(const std::string& data_dir, int /*read*/) : tables_(std::make_uniq
 void vpdDB::openTables(bool read_write) {
   int flags = read_write ? (O_RDWR | O_CREAT | O_TRUNC) : O_RDONLY;
   for (vpd::Table* t : {&tables_->chassisTbl, &tables_->bpaTbl, &tables_->smaTbl}) {
-    t->file = vpd::FileHandle(vpd::openTable(t->path.c_str(), flags, kTableMode));
+    // A previous generation that could not be moved aside is never truncated: it would be
+    // lost, and readers that have it open would see it shrink.
+    if (t->kept_previous) {
+      t->file = vpd::FileHandle(vpd::openTable(t->path.c_str(), flags, kTableMode));
+    }
     if (!t->file.valid()) {
       VPD_TRACE(ZRV_TRACE_ERROR, kOperation, loc_id_t(0), "%s", t->desc.open_failure);
       tables_.reset();
@@ -70,12 +75,14 @@ vpdDB::~vpdDB() {
 
 const std::string& vpdDB::dataDir() const { return tables_->data_dir; }
 
+// Returns 0 when there was no table or it was moved, -1 when a table is there and stays.
+// A table that exists but cannot be read is moved as well: it is still the previous
+// generation.
 int vpdDB::renameFiles(const char* table_name) {
   vpd::FileHandle probe(vpd::openTable(table_name, O_RDONLY, kTableMode));
-  if (!probe.valid()) return 0;
+  if (!probe.valid() && errno == ENOENT) return 0;
   std::string old_name = std::string(table_name) + ZRV_OLD_SUFFIX;
-  vpd::fileOps().rename(table_name, old_name.c_str());
-  return 0;
+  return vpd::fileOps().rename(table_name, old_name.c_str()) == 0 ? 0 : -1;
 }
 
 int vpdDB::getCECtimestamp(long& ts) {

@@ -16,18 +16,17 @@ enum class ScanOutcome { kEmptyTable, kNoneSelected, kSelected };
 // How many records a scan takes.
 enum class Take { kFirst, kAll };
 
-// Visits `candidates` (record numbers in table order) of table `t`, copying each into a
+// Visits `candidates` (records in table order) of table `t`, copying each into a
 // fresh scan record; `select` decides, `accept` receives each selected record. Only whole
 // records are ever examined.
 template <class Record, class Select, class Accept>
-ScanOutcome scanTable(Table& t, const RecordList& candidates, Take take, Select select,
-                      Accept accept) {
+ScanOutcome scanTable(Table& t, RecordRange candidates, Take take, Select select, Accept accept) {
   const TableSnapshot& snapshot = t.snapshot();
   if (snapshot.count() == 0) return ScanOutcome::kEmptyTable;
   bool selected = false;
   Record scan_record;
-  for (uint32_t n : candidates) {
-    snapshot.copyInto(n, scan_record);
+  for (uint64_t entry : candidates) {
+    snapshot.copyInto(recordOf(entry), scan_record);
     if (!select(scan_record)) continue;
     accept(scan_record);
     selected = true;

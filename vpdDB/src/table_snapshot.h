@@ -4,7 +4,6 @@
 
 #include <cstdint>
 #include <cstring>
-#include <vector>
 
 #include "locid.h"
 #include "table_desc.h"
@@ -13,13 +12,17 @@ namespace vpd {
 
 class TableSnapshot {
  public:
-  // Reads the open file from offset 0 to its end. A trailing partial record, and anything
-  // after an I/O error, is left out: only whole records are ever examined.
+  // Reads the open file's whole records from offset 0, as long as the file was when the
+  // snapshot was taken. A trailing partial record, and anything after an I/O error, is left
+  // out: only whole records are ever examined.
   TableSnapshot(int fd, const TableDesc& desc);
+  ~TableSnapshot();
+  TableSnapshot(const TableSnapshot&) = delete;
+  TableSnapshot& operator=(const TableSnapshot&) = delete;
 
   std::size_t count() const { return count_; }
   std::size_t recordSize() const { return record_size_; }
-  const unsigned char* record(std::size_t i) const { return bytes_.data() + i * record_size_; }
+  const unsigned char* record(std::size_t i) const { return data_ + i * record_size_; }
 
   // A byte-for-byte copy of record i into a record object.
   template <class Record>
@@ -35,7 +38,9 @@ class TableSnapshot {
   }
 
  private:
-  std::vector<unsigned char> bytes_;
+  unsigned char* data_ = nullptr;
+  std::size_t capacity_ = 0;  // bytes of the buffer
+  bool mapped_file_ = false;  // data_ maps the file itself
   std::size_t record_size_;
   std::size_t count_ = 0;
 };

@@ -38,6 +38,7 @@ struct Table {
 
   const TableDesc& desc;
   std::string path;
+  bool kept_previous = true;  // false: the previous generation could not be moved aside
   FileHandle file;
   StoreIndex store;
 
