@@ -5,6 +5,7 @@
 #include "bpa_netvpd.h"
 #include "console_discovery.h"
 #include "exit_status.h"
+#include "netvpd_run.h"
 #include "record_output.h"
 #include "requests.h"
 #include "settings.h"
@@ -55,6 +56,7 @@ bool switchLines(vpdDB& vpd, const ChipList& chips) {
 // Every switch stanza (with its frame's BPA), then one BPA stanza per frame that got a
 // switch stanza, in the order of the frame's first chip position.
 bool networkVpd(vpdDB& vpd, const ChipList& chips) {
+  NetvpdRun run(vpd);
   bool any = false;
   for (int i = 0; i < kMaxChipEntries; ++i) {
     if (!chips.isPosition(i)) continue;
@@ -62,7 +64,7 @@ bool networkVpd(vpdDB& vpd, const ChipList& chips) {
     bpaVPD bpadata;
     vpd.getSwitchvpd(u(chips.frames[i]), u(chips.cages[i]), switchdata);
     vpd.getBPAvpd(u(chips.frames[i]), kBpaCage, bpadata);
-    outputnetvpdSW(vpd, switchdata, bpadata);
+    outputnetvpdSW(run, switchdata, bpadata);
     any = true;
   }
   // Only the positions of the switch pass count here, so a frame whose first listed entry

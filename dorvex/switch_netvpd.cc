@@ -1,7 +1,5 @@
 #include "switch_netvpd.h"
 
-#include <list>
-
 #include "console_discovery.h"
 #include "output_stream.h"
 #include "record_output.h"
@@ -22,11 +20,11 @@ std::string jackLocation(const mtms& m, int slot_number, int jack) {
   return unitPrefix(m) + "-P1-C" + riseritoa(slot_number) + "-T" + riseritoa(jack);
 }
 
-std::string switchFarEnd(vpdDB& vpd, loc_id_t locid, int port) {
-  chassisVPD far_chassis;
-  vpd.getSwitchvpd(locid.getFrame(), locid.getCage(), far_chassis);
+std::string switchFarEnd(NetvpdRun& run, loc_id_t locid, int port) {
   mtms neighbormtms;
-  neighbormtms = far_chassis.sw_mtms;
+  if (const mtms* found = run.farChassis(locid.getFrame(), locid.getCage())) {
+    neighbormtms = *found;
+  }
 
   int toriser = farRiserSlot(locid.getChip());
   int tojack = 0;  // no jack number
@@ -54,12 +52,9 @@ std::string switchFarEnd(vpdDB& vpd, loc_id_t locid, int port) {
   return far;
 }
 
-std::string smaFarEnd(vpdDB& vpd, loc_id_t locid) {
-  std::list<smaVPD> smalist;
+std::string smaFarEnd(NetvpdRun& run, loc_id_t locid) {
   mtms neighbormtms;
-  if (vpd.getSMAvpd(locid.getFrame(), locid.getCage(), 1, smalist) == VPD_FOUND) {
-    neighbormtms = smalist.front().cec_mtms;
-  }
+  if (const mtms* found = run.farCec(locid.getFrame(), locid.getCage())) neighbormtms = *found;
   unsigned char sma_chip = locid.SMAchip();
   return unitPrefix(neighbormtms) + "-P1-H" + smaHDigit(sma_chip) + "Q" + smaQDigit(sma_chip);
 }
@@ -117,17 +112,17 @@ std::string smaQDigit(unsigned char sma_chip) {
   }
 }
 
-int outputCBinfo(vpdDB& vpd, mtms framemtms, loc_id_t locid, int port, int fromriser,
+int outputCBinfo(NetvpdRun& run, mtms framemtms, loc_id_t locid, int port, int fromriser,
                  int fromjack) {
   std::string local = jackLocation(framemtms, fromriser + 1, fromjack);
   std::string far;
   switch (locid.getType()) {
     case NSB:
     case ISB:
-      far = switchFarEnd(vpd, locid, port);
+      far = switchFarEnd(run, locid, port);
       break;
     case SMA:
-      far = smaFarEnd(vpd, locid);
+      far = smaFarEnd(run, locid);
       break;
     default:
       return 0;  // power, chassis, board or riser far ends have no cable line
@@ -136,7 +131,13 @@ int outputCBinfo(vpdDB& vpd, mtms framemtms, loc_id_t locid, int port, int fromr
   return 0;
 }
 
-int outputnetvpdSW(vpdDB& vpd, chassisVPD switchdata, bpaVPD bpadata) {
+int outputCBinfo(vpdDB& vpd, mtms framemtms, loc_id_t locid, int port, int fromriser,
+                 int fromjack) {
+  NetvpdRun run(vpd);
+  return outputCBinfo(run, framemtms, locid, port, fromriser, fromjack);
+}
+
+int outputnetvpdSW(NetvpdRun& run, chassisVPD switchdata, bpaVPD bpadata) {
   mtms framemtms;
   framemtms = switchdata.sw_mtms;
   mtms bpamtms;
@@ -171,11 +172,16 @@ int outputnetvpdSW(vpdDB& vpd, chassisVPD switchdata, bpaVPD bpadata) {
     switchdata.getRiserStruct(slot, i);
     fru = slot.riser_fru;
     if (outputfruSW(fru, framemtms) == 0) {
-      outputCBinfo(vpd, framemtms, slot.nbr1, slot.port1, i, 1);
-      outputCBinfo(vpd, framemtms, slot.nbr2, slot.port2, i, 2);
+      outputCBinfo(run, framemtms, slot.nbr1, slot.port1, i, 1);
+      outputCBinfo(run, framemtms, slot.nbr2, slot.port2, i, 2);
     }
   }
   return 0;
+}
+
+int outputnetvpdSW(vpdDB& vpd, chassisVPD switchdata, bpaVPD bpadata) {
+  NetvpdRun run(vpd);
+  return outputnetvpdSW(run, switchdata, bpadata);
 }
 
 }  // namespace dorvex

@@ -10,6 +10,7 @@
 
 #include <string>
 
+#include "netvpd_run.h"
 #include "vpdDB.h"
 
 namespace dorvex {
@@ -19,13 +20,18 @@ constexpr int kReportedRisers = 15;
 
 // Writes the network VPD of one switch chassis; `bpadata` is the BPA record of its frame as
 // the caller found it (possibly empty). Console lines come from zev. Far ends of cables are
-// looked up in `vpd`, the request's one database. Returns 0.
+// looked up through `run`, which the request keeps for all of its chassis. Returns 0.
+int outputnetvpdSW(NetvpdRun& run, chassisVPD switchdata, bpaVPD bpadata);
+// The same for a single chassis, on a run of its own over `vpd`.
 int outputnetvpdSW(vpdDB& vpd, chassisVPD switchdata, bpaVPD bpadata);
 
 // Writes the cable line of one local jack: "*CB " and the quoted pair of the local and the
 // far location. `locid` and `port` are the far end as stored in the riser slot, `fromriser`
 // the 0-based local slot, `fromjack` 1 or 2. A far end of another type than NSB, ISB or SMA
 // gives no line. Returns 0.
+int outputCBinfo(NetvpdRun& run, mtms framemtms, loc_id_t locid, int port, int fromriser,
+                 int fromjack);
+// The same on a run of its own over `vpd`.
 int outputCBinfo(vpdDB& vpd, mtms framemtms, loc_id_t locid, int port, int fromriser, int fromjack);
 
 // "1" to "16" for 1 to 16; the empty text for anything else.
