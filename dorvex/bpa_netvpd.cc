@@ -9,20 +9,13 @@ int outputnetvpdBPA(bpaVPD bpadata) {
   mtms framemtms;
   framemtms = bpadata.frame_mtms;
 
-  writeLine("*FC ????????");
-  writeLine("*VC 5.0");
-  writeLine("*DS MT/M Serial VPD");
-  writeLine("*YK BPA");
-  writeLine("*YL U1.35");
-  writeKeyword("SE", framemtms.getSE());
-  writeKeyword("TM", framemtms.getTM());
-  writeLine("*VK TQ4M");
+  FILE* out = outStream();
+  putText(out, "*FC ????????\n*VC 5.0\n*DS MT/M Serial VPD\n*YK BPA\n*YL U1.35\n");
+  writeKeyword(out, "SE", framemtms.se, mtms::kSeChars);
+  writeKeyword(out, "TM", framemtms.tm, mtms::kTmChars);
+  putText(out, "*VK TQ4M\n");
 
-  fru_stanza fru;
-  auto write = [&](const fru_stanza& unit) {
-    fru = unit;
-    outputfruBPA(fru, framemtms);
-  };
+  auto write = [&](const fru_stanza& unit) { outputfruBPA(unit, framemtms); };
   write(bpadata.bpc1_fru);
   for (const fru_stanza& unit : bpadata.bpr1_fru) write(unit);
   for (const fru_stanza& unit : bpadata.bpd1_fru) write(unit);

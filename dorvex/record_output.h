@@ -7,11 +7,13 @@
 #ifndef DORVEX_RECORD_OUTPUT_H_
 #define DORVEX_RECORD_OUTPUT_H_
 
-#include <string>
+#include <cstddef>
+#include <cstdio>
 
 #include "fru_stanza.h"
 #include "locid.h"
 #include "mtms.h"
+#include "output_stream.h"
 
 namespace dorvex {
 
@@ -33,11 +35,23 @@ int outputfruSW(fru_stanza fru, mtms framemtms);
 // Nothing is written for a FRU without part number or FRU number. `framemtms` is unused.
 void outputfruBPA(fru_stanza fru, mtms framemtms);
 
-// "*" + keyword + " " + value, as one line.
-void writeKeyword(const char* keyword, const std::string& value);
+// "*" + keyword + " ": the start of a keyword line; the caller writes the value and the
+// newline.
+inline void startKeyword(FILE* out, const char* keyword) {
+  putChar(out, '*');
+  putText(out, keyword);
+  putChar(out, ' ');
+}
 
-// The quoted pair "\"first\" \"second\"".
-std::string quotedPair(const std::string& first, const std::string& second);
+// A whole keyword line whose value is the text of a fixed-width field.
+void writeKeyword(FILE* out, const char* keyword, const char* field, std::size_t significant);
+
+// The text form of an MTMS (mtms::text()): the printable leading characters of tm, "*",
+// those of se.
+void putMtmsText(FILE* out, const mtms& m);
+
+// The quoted pair of an MTMS's field texts: "\"tm\" \"se\"".
+void putQuotedMtms(FILE* out, const mtms& m);
 
 }  // namespace dorvex
 

@@ -13,19 +13,43 @@ const unsigned int chip_riser_map[8] = {8, 4, 12, 0, 14, 2, 10, 6};
 // Characters of the chassis timestamp that the header shows.
 constexpr std::size_t kTimestampChars = 27;
 
-// "U" + tm + se, both up to their first NUL.
-std::string unitPrefix(const mtms& m) { return "U" + m.getTM() + m.getSE(); }
-
-std::string jackLocation(const mtms& m, int slot_number, int jack) {
-  return unitPrefix(m) + "-P1-C" + riseritoa(slot_number) + "-T" + riseritoa(jack);
+// The digits of riser number n into `digits`; returns how many (none outside 1 to 16).
+std::size_t riserDigits(int n, char (&digits)[2]) {
+  if (n < 1 || n > 16) return 0;
+  if (n < 10) {
+    digits[0] = static_cast<char>('0' + n);
+    return 1;
+  }
+  digits[0] = static_cast<char>('0' + n / 10);
+  digits[1] = static_cast<char>('0' + n % 10);
+  return 2;
 }
 
-std::string switchFarEnd(NetvpdRun& run, loc_id_t locid, int port) {
-  mtms neighbormtms;
-  if (const mtms* found = run.farChassis(locid.getFrame(), locid.getCage())) {
-    neighbormtms = *found;
-  }
+void putRiserNumber(FILE* out, int n) {
+  char digits[2];
+  putBytes(out, digits, riserDigits(n, digits));
+}
 
+// "U" + tm + se, both up to their first NUL; just "U" for an unknown unit (null).
+void putUnit(FILE* out, const mtms* m) {
+  putChar(out, 'U');
+  if (m == nullptr) return;
+  putField(out, m->tm, mtms::kTmChars);
+  putField(out, m->se, mtms::kSeChars);
+}
+
+void putJackLocation(FILE* out, const mtms* m, int slot_number, int jack) {
+  putUnit(out, m);
+  putText(out, "-P1-C");
+  putRiserNumber(out, slot_number);
+  putText(out, "-T");
+  putRiserNumber(out, jack);
+}
+
+// The jack of a far switch chassis (`far_chassis`, null when it has no record) that
+// `locid` and `port` name; nothing for a far end at frame 0, cage 0 (none recorded).
+void putSwitchFarEnd(FILE* out, const mtms* far_chassis, loc_id_t locid, int port) {
+  if (locid.getFrame() == 0 && locid.getCage() == 0) return;
   int toriser = farRiserSlot(locid.getChip());
   int tojack = 0;  // no jack number
   switch (port) {
@@ -46,28 +70,25 @@ std::string switchFarEnd(NetvpdRun& run, loc_id_t locid, int port) {
     default:
       break;
   }
-  // riseritoa(0) is empty, so a chip without a slot gives an empty slot number.
-  std::string far = jackLocation(neighbormtms, toriser + 1, tojack);
-  if (locid.getFrame() == 0 && locid.getCage() == 0) far.clear();  // no far end recorded
-  return far;
+  // A chip without a slot gives riser number 0, which shows as an empty slot number.
+  putJackLocation(out, far_chassis, toriser + 1, tojack);
 }
 
-std::string smaFarEnd(NetvpdRun& run, loc_id_t locid) {
-  mtms neighbormtms;
-  if (const mtms* found = run.farCec(locid.getFrame(), locid.getCage())) neighbormtms = *found;
+// The SMA port of a far CEC (`cec`, null when it has no record) that `locid` names.
+void putSmaFarEnd(FILE* out, const mtms* cec, loc_id_t locid) {
   unsigned char sma_chip = locid.SMAchip();
-  return unitPrefix(neighbormtms) + "-P1-H" + smaHDigit(sma_chip) + "Q" + smaQDigit(sma_chip);
+  putUnit(out, cec);
+  putText(out, "-P1-H");
+  putText(out, smaHDigit(sma_chip));
+  putChar(out, 'Q');
+  putText(out, smaQDigit(sma_chip));
 }
 
 }  // namespace
 
 std::string riseritoa(int n) {
-  std::string text;
-  if (n >= 1 && n <= 16) {
-    if (n > 9) text += static_cast<char>('0' + n / 10);
-    text += static_cast<char>('0' + n % 10);
-  }
-  return text;
+  char digits[2];
+  return std::string(digits, riserDigits(n, digits));
 }
 
 int farRiserSlot(unsigned int chip) {
@@ -76,7 +97,7 @@ int farRiserSlot(unsigned int chip) {
              : -1;
 }
 
-std::string smaHDigit(unsigned char sma_chip) {
+const char* smaHDigit(unsigned char sma_chip) {
   switch (sma_chip) {
     case 2:
     case 3:
@@ -93,7 +114,7 @@ std::string smaHDigit(unsigned char sma_chip) {
   }
 }
 
-std::string smaQDigit(unsigned char sma_chip) {
+const char* smaQDigit(unsigned char sma_chip) {
   switch (sma_chip) {
     case 8:
     case 12:
@@ -114,20 +135,31 @@ std::string smaQDigit(unsigned char sma_chip) {
 
 int outputCBinfo(NetvpdRun& run, mtms framemtms, loc_id_t locid, int port, int fromriser,
                  int fromjack) {
-  std::string local = jackLocation(framemtms, fromriser + 1, fromjack);
-  std::string far;
+  bool to_switch;
+  const mtms* far;  // the far unit's MTMS, looked up before anything of the line is written
   switch (locid.getType()) {
     case NSB:
     case ISB:
-      far = switchFarEnd(run, locid, port);
+      to_switch = true;
+      far = run.farChassis(locid.getFrame(), locid.getCage());
       break;
     case SMA:
-      far = smaFarEnd(run, locid);
+      to_switch = false;
+      far = run.farCec(locid.getFrame(), locid.getCage());
       break;
     default:
       return 0;  // power, chassis, board or riser far ends have no cable line
   }
-  writeKeyword("CB", quotedPair(local, far));
+  FILE* out = outStream();
+  putText(out, "*CB \"");
+  putJackLocation(out, &framemtms, fromriser + 1, fromjack);
+  putText(out, "\" \"");
+  if (to_switch) {
+    putSwitchFarEnd(out, far, locid, port);
+  } else {
+    putSmaFarEnd(out, far, locid);
+  }
+  putText(out, "\"\n");
   return 0;
 }
 
@@ -143,35 +175,35 @@ int outputnetvpdSW(NetvpdRun& run, chassisVPD switchdata, bpaVPD bpadata) {
   mtms bpamtms;
   bpamtms = bpadata.frame_mtms;
 
-  writeLine("*FC ????????");
-  writeLine("*DS 4 GB Switch");
-  writeKeyword("YL", "U" + framemtms.text());
-  writeKeyword("SE", framemtms.getSE());
-  writeKeyword("TM", framemtms.getTM());
-  writeLine("*MN QOR");
-  writeKeyword("N2", vpd::fieldText(switchdata.timestamp, kTimestampChars));
+  FILE* out = outStream();
+  putText(out, "*FC ????????\n*DS 4 GB Switch\n");
+  startKeyword(out, "YL");
+  putChar(out, 'U');
+  putMtmsText(out, framemtms);
+  putChar(out, '\n');
+  writeKeyword(out, "SE", framemtms.se, mtms::kSeChars);
+  writeKeyword(out, "TM", framemtms.tm, mtms::kTmChars);
+  putText(out, "*MN QOR\n");
+  writeKeyword(out, "N2", switchdata.timestamp, kTimestampChars);
   for (const zev_info_t& console : zev) {
     for (const bpa_info_t& bpa : console.bpa) {
       if (bpa.bpamtms == bpamtms) {
-        writeKeyword("V1", quotedPair(console.zevmtms.getTM(), console.zevmtms.getSE()));
+        startKeyword(out, "V1");
+        putQuotedMtms(out, console.zevmtms);
+        putChar(out, '\n');
       }
     }
   }
-  writeKeyword("RD", quotedPair(bpamtms.getTM(), bpamtms.getSE()));
+  startKeyword(out, "RD");
+  putQuotedMtms(out, bpamtms);
+  putChar(out, '\n');
 
-  fru_stanza fru;
-  fru = switchdata.sw_fru;
-  outputfruSW(fru, framemtms);
-  fru = switchdata.dca1_fru;
-  outputfruSW(fru, framemtms);
-  fru = switchdata.dca2_fru;
-  outputfruSW(fru, framemtms);
-
+  outputfruSW(switchdata.sw_fru, framemtms);
+  outputfruSW(switchdata.dca1_fru, framemtms);
+  outputfruSW(switchdata.dca2_fru, framemtms);
   for (int i = 0; i < kReportedRisers; ++i) {
-    riser_vpd_t slot;
-    switchdata.getRiserStruct(slot, i);
-    fru = slot.riser_fru;
-    if (outputfruSW(fru, framemtms) == 0) {
+    const riser_vpd_t& slot = switchdata.riser[i];
+    if (outputfruSW(slot.riser_fru, framemtms) == 0) {
       outputCBinfo(run, framemtms, slot.nbr1, slot.port1, i, 1);
       outputCBinfo(run, framemtms, slot.nbr2, slot.port2, i, 2);
     }

@@ -42,9 +42,9 @@ std::string riseritoa(int n);
 int farRiserSlot(unsigned int chip);
 
 // The H and Q digits of an SMA far end (from its SMA chip number); empty for a chip with
-// no SMA chip number.
-std::string smaHDigit(unsigned char sma_chip);
-std::string smaQDigit(unsigned char sma_chip);
+// no SMA chip number. Static texts.
+const char* smaHDigit(unsigned char sma_chip);
+const char* smaQDigit(unsigned char sma_chip);
 
 }  // namespace dorvex
 
