@@ -5,7 +5,9 @@
 #define DORVEX_NETVPD_RUN_H_
 
 #include <cstdint>
+#include <string>
 #include <unordered_map>
+#include <vector>
 
 #include "vpdDB.h"
 
@@ -31,14 +33,28 @@ class NetvpdRun {
   // lists it), or null when there is none; remembered on the same terms as farChassis.
   const mtms* farCec(unsigned int frame, unsigned int cage);
 
+  // The MTMS of every console that lists a BPA equal (mtms ==) to `bpa`: one entry per such
+  // listing, in the order of zev and of each console's BPA list, duplicates kept. The
+  // consoles are those of zev, which must not change during the run. The reference stays
+  // valid until the next call.
+  const std::vector<mtms>& consolesReaching(const mtms& bpa);
+
  private:
   static uint64_t positionKey(unsigned int frame, unsigned int cage) {
     return (uint64_t{frame} << 32) | cage;
   }
 
+  // Equal for two MTMS exactly when they compare equal: each field's text up to its first
+  // NUL, padded with NUL to the field's significant length.
+  static std::string mtmsKey(const mtms& m);
+
   vpdDB& vpd_;
   std::unordered_map<uint64_t, mtms> far_chassis_;
   std::unordered_map<uint64_t, mtms> far_cecs_;
+
+  int console_queries_ = 0;
+  std::vector<mtms> first_consoles_;  // the answer to the first query
+  std::unordered_map<std::string, std::vector<mtms>> consoles_by_bpa_;
 };
 
 }  // namespace dorvex

@@ -1,6 +1,5 @@
 #include "switch_netvpd.h"
 
-#include "console_discovery.h"
 #include "output_stream.h"
 #include "record_output.h"
 
@@ -185,14 +184,10 @@ int outputnetvpdSW(NetvpdRun& run, chassisVPD switchdata, bpaVPD bpadata) {
   writeKeyword(out, "TM", framemtms.tm, mtms::kTmChars);
   putText(out, "*MN QOR\n");
   writeKeyword(out, "N2", switchdata.timestamp, kTimestampChars);
-  for (const zev_info_t& console : zev) {
-    for (const bpa_info_t& bpa : console.bpa) {
-      if (bpa.bpamtms == bpamtms) {
-        startKeyword(out, "V1");
-        putQuotedMtms(out, console.zevmtms);
-        putChar(out, '\n');
-      }
-    }
+  for (const mtms& console : run.consolesReaching(bpamtms)) {
+    startKeyword(out, "V1");
+    putQuotedMtms(out, console);
+    putChar(out, '\n');
   }
   startKeyword(out, "RD");
   putQuotedMtms(out, bpamtms);

@@ -6,8 +6,11 @@
 
 #include <cstdio>
 #include <cstring>
+#include <random>
 #include <string>
+#include <vector>
 
+#include "console_discovery.h"
 #include "installation.h"
 #include "switch_netvpd.h"
 
@@ -136,6 +139,73 @@ TEST(NetvpdRun, EachRunAnswersFromItsOwnTables) {
       EXPECT_EQ(out.text(), c.line) << "call " << call;
     }
   }
+}
+
+// A random MTMS from few characters, often cut short by a NUL with other bytes after it, so
+// that many differ in their bytes and still compare equal.
+mtms nearlyEqualMtms(std::mt19937& rng) {
+  mtms m;
+  std::memcpy(m.tm, "AAAAAAAAx", sizeof m.tm);  // no terminator within the width
+  std::memcpy(m.se, "1111111y", sizeof m.se);
+  m.tm[rng() % 2] = 'B';
+  m.se[0] = "12"[rng() % 2];
+  auto cut = [&](char* field, std::size_t width) {  // a NUL, and other bytes behind it
+    std::size_t at = rng() % width;
+    field[at] = '\0';
+    for (std::size_t i = at + 1; i <= width; ++i) field[i] = "AB1"[rng() % 3];
+  };
+  if (rng() % 2 == 0) cut(m.tm, mtms::kTmChars);
+  if (rng() % 2 == 0) cut(m.se, mtms::kSeChars);
+  return m;
+}
+
+// All 17 bytes, where assignment would copy only up to each field's NUL.
+void setRaw(mtms& to, const mtms& from) {
+  std::memcpy(static_cast<void*>(&to), static_cast<const void*>(&from), sizeof to);
+}
+
+std::vector<std::string> texts(const std::vector<mtms>& list) {
+  std::vector<std::string> t;
+  for (const mtms& m : list) t.push_back(m.getTM() + "/" + m.getSE());
+  return t;
+}
+
+// The consoles that reach a BPA are those a comparison with every BPA of every console
+// finds, in that order, whether asked first in a run or later.
+TEST(NetvpdRun, ConsolesReachingABpaAreThoseOfAFullComparison) {
+  Installation inst;
+  inst.writeTables();
+  vpdDB db(inst.path("data"), 1);
+  std::mt19937 rng(20240612);
+  for (int round = 0; round < 50; ++round) {
+    dorvex::zev.assign(rng() % 4, dorvex::zev_info_t());
+    std::vector<mtms> asked;
+    for (dorvex::zev_info_t& console : dorvex::zev) {
+      setRaw(console.zevmtms, nearlyEqualMtms(rng));
+      console.bpa.resize(rng() % 6);
+      for (dorvex::bpa_info_t& bpa : console.bpa) {
+        setRaw(bpa.bpamtms, nearlyEqualMtms(rng));
+        asked.push_back(bpa.bpamtms);
+      }
+    }
+    for (int i = 0; i < 4; ++i) asked.push_back(nearlyEqualMtms(rng));  // maybe listed nowhere
+
+    dorvex::NetvpdRun run(db);
+    for (std::size_t q = 0; q < asked.size(); ++q) {
+      std::vector<mtms> expected;
+      for (const dorvex::zev_info_t& console : dorvex::zev) {
+        for (const dorvex::bpa_info_t& bpa : console.bpa) {
+          if (bpa.bpamtms == asked[q]) expected.push_back(console.zevmtms);
+        }
+      }
+      ASSERT_EQ(texts(run.consolesReaching(asked[q])), texts(expected))
+          << "round " << round << ", query " << q;
+      dorvex::NetvpdRun fresh(db);
+      ASSERT_EQ(texts(fresh.consolesReaching(asked[q])), texts(expected))
+          << "round " << round << ", query " << q << " as a run's first";
+    }
+  }
+  dorvex::zev.clear();
 }
 
 // End to end: a far chassis that is missing is looked up, and traced, for each of its cable
