@@ -79,20 +79,37 @@ SwitchChipCollector::SwitchChipCollector(int network, int* frames, int* cages)
 }
 
 void SwitchChipCollector::feed(const char* data, std::size_t length) {
-  for (std::size_t i = 0; i < length; ++i) {
-    char c = data[i];
+  const char* p = data;
+  const char* end = data + length;
+  while (p < end) {
+    if (skipping_) {
+      // Nothing more of this line can change what it stores: go straight to its newline.
+      p = static_cast<const char*>(std::memchr(p, '\n', static_cast<std::size_t>(end - p)));
+      if (p == nullptr) return;
+    }
+    char c = *p++;
     if (c == '\n') {
       endLine();
     } else if (c == ' ') {
+      // The end of the type field decides whether the line is a chip line at all.
+      if (in_field_ && fields_ == 3 && !typeIsSwitchChip()) skipping_ = true;
       in_field_ = false;
     } else {
       if (!in_field_) {
         in_field_ = true;
-        if (fields_ <= 6) ++fields_;  // 7 stands for "seventh or later"
+        if (++fields_ == 7) {  // fields from the seventh on are not used
+          skipping_ = true;
+          continue;
+        }
       }
       addToField(c);
     }
   }
+}
+
+bool SwitchChipCollector::typeIsSwitchChip() const {
+  return type_length_ == kSwitchChipTypeLength &&
+         std::memcmp(type_, kSwitchChipType, kSwitchChipTypeLength) == 0;
 }
 
 void SwitchChipCollector::finish() {
@@ -119,9 +136,7 @@ void SwitchChipCollector::addToField(char c) {
 }
 
 void SwitchChipCollector::endLine() {
-  bool is_switch_chip = type_length_ == kSwitchChipTypeLength &&
-                        std::memcmp(type_, kSwitchChipType, kSwitchChipTypeLength) == 0;
-  if (fields_ >= 6 && is_switch_chip && static_cast<int>(network_field_.value()) == network_ &&
+  if (fields_ >= 6 && typeIsSwitchChip() && static_cast<int>(network_field_.value()) == network_ &&
       num_ < kMaxChipEntries) {
     int frame = static_cast<int>(frame_.value());
     int cage = static_cast<int>(cage_.value());
@@ -133,6 +148,7 @@ void SwitchChipCollector::endLine() {
   }
   fields_ = 0;
   in_field_ = false;
+  skipping_ = false;
   frame_ = StreamingDecimal();
   cage_ = StreamingDecimal();
   network_field_ = StreamingDecimal();

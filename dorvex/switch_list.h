@@ -53,6 +53,7 @@ class SwitchChipCollector {
 
  private:
   void addToField(char c);
+  bool typeIsSwitchChip() const;
   void endLine();
 
   int network_;
@@ -62,8 +63,9 @@ class SwitchChipCollector {
   std::unordered_set<uint64_t> stored_;  // positions stored so far
 
   // State of the current line.
-  int fields_ = 0;  // fields begun so far
+  int fields_ = 0;  // fields begun so far, up to 7
   bool in_field_ = false;
+  bool skipping_ = false;  // the rest of the line cannot matter
   StreamingDecimal frame_, cage_, network_field_;
   char type_[7] = {};
   std::size_t type_length_ = 0;

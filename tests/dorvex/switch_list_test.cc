@@ -130,6 +130,34 @@ TEST(SwitchList, LinesAndFields) {
   }
 }
 
+// Pieces may end anywhere, also in a part of a line that is passed over unread: cut every
+// text at every pair of places and compare with feeding it whole.
+TEST(SwitchList, PiecesEndAnywhere) {
+  const char* texts[] = {
+      "3 2 SW_CHIP 0 1 1\n4 2 BPA 0 1 1\n5 2 SW_CHIP 0 1 1 x y z\n6 2 SW_CHIP 0 1 1",
+      "7 7 SMA 0 1 1 SW_CHIP\n8 8 SW_CHIP 0 1 1\n9 9 SW_CHIPS 0 1 1 8 8\n",
+      "1 1 SW_CHI 0 0 1\n2 2 SW_CHIP\t0 0 1\n3 3 SW_CHIP 0 0 1\t1\n 4  4  SW_CHIP  0  0  1  \n",
+      "5 5 SW_CHIP 0 0\n6 6 SW_CHIP 0 0 1 7\n7 7 X\n\n8 8 SW_CHIP 0 0 1",
+  };
+  for (const std::string text : texts) {
+    Chips whole;
+    int n = collect(text, 1, whole, false);
+    ASSERT_GT(n, 0) << text;
+    for (std::size_t a = 0; a <= text.size(); ++a) {
+      for (std::size_t b = a; b <= text.size(); ++b) {
+        Chips chips;
+        dorvex::SwitchChipCollector collector(1, chips.frames.data(), chips.cages.data());
+        collector.feed(text.data(), a);
+        collector.feed(text.data() + a, b - a);
+        collector.feed(text.data() + b, text.size() - b);
+        collector.finish();
+        ASSERT_EQ(collector.count(), n) << text << " cut at " << a << " and " << b;
+        ASSERT_EQ(chips.first(n), whole.first(n)) << text << " cut at " << a << " and " << b;
+      }
+    }
+  }
+}
+
 TEST(SwitchList, StoresAtMost2048EntriesAndReadsTheRest) {
   std::string text;
   for (int i = 1; i <= 3000; ++i) {
