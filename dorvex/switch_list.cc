@@ -81,7 +81,18 @@ SwitchChipCollector::SwitchChipCollector(int network, int* frames, int* cages)
 void SwitchChipCollector::feed(const char* data, std::size_t length) {
   const char* p = data;
   const char* end = data + length;
+  bool newline_ahead = true;  // until a search for one fails: then none is left in this piece
   while (p < end) {
+    if (fields_ == 0 && newline_ahead) {  // nothing but blanks of this line seen so far
+      const char* newline =
+          static_cast<const char*>(std::memchr(p, '\n', static_cast<std::size_t>(end - p)));
+      if (newline != nullptr) {  // the whole line is here: read it at once
+        readLine(p, newline);
+        p = newline + 1;
+        continue;
+      }
+      newline_ahead = false;
+    }
     if (skipping_) {
       // Nothing more of this line can change what it stores: go straight to its newline.
       p = static_cast<const char*>(std::memchr(p, '\n', static_cast<std::size_t>(end - p)));
@@ -105,6 +116,33 @@ void SwitchChipCollector::feed(const char* data, std::size_t length) {
       addToField(c);
     }
   }
+}
+
+// The same reading as the byte-by-byte one, on a line that lies whole in one piece: only
+// the line's first six fields are found, and only a chip line's numbers are read.
+void SwitchChipCollector::readLine(const char* p, const char* end) {
+  struct {
+    const char* begin;
+    const char* end;
+  } field[6];
+  int count = 0;
+  while (count < 6) {
+    while (p < end && *p == ' ') ++p;
+    if (p == end) return;  // fewer than six fields
+    field[count].begin = p;
+    while (p < end && *p != ' ') ++p;
+    field[count++].end = p;
+    if (count == 3 && (static_cast<std::size_t>(p - field[2].begin) < kSwitchChipTypeLength ||
+                       std::memcmp(field[2].begin, kSwitchChipType, kSwitchChipTypeLength) != 0)) {
+      return;  // not a chip line
+    }
+  }
+  auto number = [&](int i) {
+    StreamingDecimal d;
+    for (const char* c = field[i].begin; c < field[i].end; ++c) d.add(*c);
+    return static_cast<int>(d.value());
+  };
+  if (number(5) == network_) store(number(0), number(1));
 }
 
 bool SwitchChipCollector::typeIsSwitchChip() const {
@@ -136,15 +174,8 @@ void SwitchChipCollector::addToField(char c) {
 }
 
 void SwitchChipCollector::endLine() {
-  if (fields_ >= 6 && typeIsSwitchChip() && static_cast<int>(network_field_.value()) == network_ &&
-      num_ < kMaxChipEntries) {
-    int frame = static_cast<int>(frame_.value());
-    int cage = static_cast<int>(cage_.value());
-    if (stored_.insert(positionKey(frame, cage)).second) {
-      frames_[num_] = frame;
-      cages_[num_] = cage;
-    }  // else a repeat: its entry stays a (0, 0) hole
-    ++num_;
+  if (fields_ >= 6 && typeIsSwitchChip() && static_cast<int>(network_field_.value()) == network_) {
+    store(static_cast<int>(frame_.value()), static_cast<int>(cage_.value()));
   }
   fields_ = 0;
   in_field_ = false;
@@ -153,6 +184,15 @@ void SwitchChipCollector::endLine() {
   cage_ = StreamingDecimal();
   network_field_ = StreamingDecimal();
   type_length_ = 0;
+}
+
+void SwitchChipCollector::store(int frame, int cage) {
+  if (num_ == kMaxChipEntries) return;
+  if (stored_.insert(positionKey(frame, cage)).second) {
+    frames_[num_] = frame;
+    cages_[num_] = cage;
+  }  // else a repeat: its entry stays a (0, 0) hole
+  ++num_;
 }
 
 int getSwitchList(int network, int* frames, int* cages) {

@@ -52,9 +52,12 @@ class SwitchChipCollector {
   int count() const { return num_; }
 
  private:
+  void readLine(const char* begin, const char* end);
   void addToField(char c);
   bool typeIsSwitchChip() const;
   void endLine();
+  // Stores a chip line's position at the next index, or a hole for a repeat.
+  void store(int frame, int cage);
 
   int network_;
   int* frames_;

@@ -158,6 +158,20 @@ TEST(SwitchList, PiecesEndAnywhere) {
   }
 }
 
+// A piece of blanks without a newline is looked through once, not once per blank (which
+// would take hours here).
+TEST(SwitchList, ALongPieceWithoutANewlineIsReadOnce) {
+  const std::string blanks(8 << 20, ' ');
+  Chips chips;
+  dorvex::SwitchChipCollector collector(1, chips.frames.data(), chips.cages.data());
+  collector.feed(blanks.data(), blanks.size());
+  const std::string rest = "3 2 SW_CHIP 0 1 1\n4 2 SW_CHIP 0 1 1\n";
+  collector.feed(rest.data(), rest.size());
+  collector.finish();
+  EXPECT_EQ(collector.count(), 2);
+  EXPECT_EQ(chips.first(2), (Positions{{3, 2}, {4, 2}}));
+}
+
 TEST(SwitchList, StoresAtMost2048EntriesAndReadsTheRest) {
   std::string text;
   for (int i = 1; i <= 3000; ++i) {
