@@ -25,6 +25,15 @@ const mtms* NetvpdRun::farCec(unsigned int frame, unsigned int cage) {
   return &far_cecs_.emplace(key, records.front().cec_mtms).first->second;
 }
 
+mtms NetvpdRun::bpaMtmsAt(unsigned int frame, unsigned int cage) {
+  uint64_t key = positionKey(frame, cage);
+  auto known = bpas_.find(key);
+  if (known != bpas_.end()) return known->second;
+  bpaVPD record;
+  if (vpd_.getBPAvpd(frame, cage, record) != VPD_FOUND) return mtms();
+  return bpas_.emplace(key, record.frame_mtms).first->second;
+}
+
 std::string NetvpdRun::mtmsKey(const mtms& m) {
   std::string key(mtms::kTmChars + mtms::kSeChars, '\0');
   std::memcpy(&key[0], m.tm, strnlen(m.tm, mtms::kTmChars));

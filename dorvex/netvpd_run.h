@@ -21,8 +21,6 @@ class NetvpdRun {
   NetvpdRun(const NetvpdRun&) = delete;
   NetvpdRun& operator=(const NetvpdRun&) = delete;
 
-  vpdDB& db() { return vpd_; }
-
   // The MTMS of the first switch chassis at frame and cage (as getSwitchvpd assigns it), or
   // null when there is none. A chassis that was found is remembered; one that was not is
   // looked up again on every call, so each of its cable lines traces its own not-found.
@@ -32,6 +30,10 @@ class NetvpdRun {
   // The CEC MTMS of the first SMA record of adapter 1 at frame and cage (as getSMAvpd
   // lists it), or null when there is none; remembered on the same terms as farChassis.
   const mtms* farCec(unsigned int frame, unsigned int cage);
+
+  // The frame MTMS of the first BPA record at frame and cage (as getBPAvpd assigns it), or
+  // the empty MTMS when there is none; remembered on the same terms as farChassis.
+  mtms bpaMtmsAt(unsigned int frame, unsigned int cage);
 
   // The MTMS of every console that lists a BPA equal (mtms ==) to `bpa`: one entry per such
   // listing, in the order of zev and of each console's BPA list, duplicates kept. The
@@ -51,6 +53,7 @@ class NetvpdRun {
   vpdDB& vpd_;
   std::unordered_map<uint64_t, mtms> far_chassis_;
   std::unordered_map<uint64_t, mtms> far_cecs_;
+  std::unordered_map<uint64_t, mtms> bpas_;
 
   int console_queries_ = 0;
   std::vector<mtms> first_consoles_;  // the answer to the first query

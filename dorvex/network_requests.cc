@@ -61,10 +61,9 @@ bool networkVpd(vpdDB& vpd, const ChipList& chips) {
   for (int i = 0; i < kMaxChipEntries; ++i) {
     if (!chips.isPosition(i)) continue;
     chassisVPD switchdata;
-    bpaVPD bpadata;
     vpd.getSwitchvpd(u(chips.frames[i]), u(chips.cages[i]), switchdata);
-    vpd.getBPAvpd(u(chips.frames[i]), kBpaCage, bpadata);
-    outputnetvpdSW(run, switchdata, bpadata);
+    // The stanza shows only the MTMS of the frame's BPA; the run remembers it per frame.
+    writeSwitchStanza(run, switchdata, run.bpaMtmsAt(u(chips.frames[i]), kBpaCage));
     any = true;
   }
   // Only the positions of the switch pass count here, so a frame whose first listed entry

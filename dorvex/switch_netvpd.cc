@@ -169,10 +169,15 @@ int outputCBinfo(vpdDB& vpd, mtms framemtms, loc_id_t locid, int port, int fromr
 }
 
 int outputnetvpdSW(NetvpdRun& run, chassisVPD switchdata, bpaVPD bpadata) {
-  mtms framemtms;
-  framemtms = switchdata.sw_mtms;
   mtms bpamtms;
   bpamtms = bpadata.frame_mtms;
+  writeSwitchStanza(run, switchdata, bpamtms);
+  return 0;
+}
+
+void writeSwitchStanza(NetvpdRun& run, const chassisVPD& switchdata, const mtms& bpamtms) {
+  mtms framemtms;
+  framemtms = switchdata.sw_mtms;
 
   FILE* out = outStream();
   putText(out, "*FC ????????\n*DS 4 GB Switch\n");
@@ -203,7 +208,6 @@ int outputnetvpdSW(NetvpdRun& run, chassisVPD switchdata, bpaVPD bpadata) {
       outputCBinfo(run, framemtms, slot.nbr2, slot.port2, i, 2);
     }
   }
-  return 0;
 }
 
 int outputnetvpdSW(vpdDB& vpd, chassisVPD switchdata, bpaVPD bpadata) {

@@ -24,6 +24,8 @@ constexpr int kReportedRisers = 15;
 int outputnetvpdSW(NetvpdRun& run, chassisVPD switchdata, bpaVPD bpadata);
 // The same for a single chassis, on a run of its own over `vpd`.
 int outputnetvpdSW(vpdDB& vpd, chassisVPD switchdata, bpaVPD bpadata);
+// What outputnetvpdSW writes, given only what it uses of the BPA record: its frame MTMS.
+void writeSwitchStanza(NetvpdRun& run, const chassisVPD& switchdata, const mtms& bpamtms);
 
 // Writes the cable line of one local jack: "*CB " and the quoted pair of the local and the
 // far location. `locid` and `port` are the far end as stored in the riser slot, `fromriser`

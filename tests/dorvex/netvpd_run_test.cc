@@ -1,5 +1,6 @@
-// What a network VPD run remembers between the chassis it writes: far ends of cable lines
-// that were found, and nothing that was not.
+// What a network VPD run remembers between the chassis it writes: the far ends of cable
+// lines and the frame BPAs that were found (nothing that was not), and the consoles that
+// reach each BPA.
 #include "netvpd_run.h"
 
 #include <gtest/gtest.h>
@@ -64,31 +65,47 @@ TEST(NetvpdRun, RemembersOnlyTheFarEndsThatWereFound) {
   std::memcpy(junk.sw_mtms.tm, "7045\0XYZ", 8);  // bytes after the terminator never show
   std::memcpy(junk.sw_mtms.se, "AB\0CDEF", 7);
   appendRecord(inst.path("data/chassis_vpd.db"), junk);
+  bpaVPD bpa;
+  bpa.loc_id = location(2, 255, 0, BPA);
+  bpa.frame_mtms = mtms("9458-100", "BPAONE1");
+  appendRecord(inst.path("data/bpa_vpd.db"), bpa);
+  bpa.frame_mtms = mtms("9458-100", "BPATWO2");
+  appendRecord(inst.path("data/bpa_vpd.db"), bpa);
   vpdDB db(inst.path("data"), 1);
   const std::string trace_file = inst.path("writer-trace.log");
 
+  enum Kind { kChassis, kCec, kBpa };
   struct {
     const char* name;
-    bool cec;
+    Kind kind;
     unsigned frame, cage;
     const char* found;  // the MTMS text, or null for "not found"
   } cases[] = {
-      {"first of two chassis", false, 2, 4, "7045-SW4*FIRST01"},
-      {"chassis at frame 0, cage 0", false, 0, 0, "7045-SW4*ORIGIN0"},
-      {"bytes after a terminator", false, 3, 1, "7045*AB"},
-      {"missing chassis", false, 7, 7, nullptr},
-      {"chassis at a CEC's place", false, 5, 3, nullptr},
-      {"first SMA record of adapter 1", true, 5, 3, "9119-595*CEC0001"},
-      {"CEC with adapter 2 only", true, 5, 2, nullptr},
-      {"missing CEC", true, 9, 9, nullptr},
-      {"CEC at a chassis's place", true, 2, 4, nullptr},
+      {"first of two chassis", kChassis, 2, 4, "7045-SW4*FIRST01"},
+      {"chassis at frame 0, cage 0", kChassis, 0, 0, "7045-SW4*ORIGIN0"},
+      {"bytes after a terminator", kChassis, 3, 1, "7045*AB"},
+      {"missing chassis", kChassis, 7, 7, nullptr},
+      {"chassis at a CEC's place", kChassis, 5, 3, nullptr},
+      {"first SMA record of adapter 1", kCec, 5, 3, "9119-595*CEC0001"},
+      {"CEC with adapter 2 only", kCec, 5, 2, nullptr},
+      {"missing CEC", kCec, 9, 9, nullptr},
+      {"CEC at a chassis's place", kCec, 2, 4, nullptr},
+      {"first of two BPAs", kBpa, 2, 255, "9458-100*BPAONE1"},
+      {"missing BPA", kBpa, 3, 255, nullptr},
+      {"BPA at a chassis's place", kBpa, 2, 4, nullptr},
   };
   for (const auto& c : cases) {
     std::string before = fileText(trace_file);
     dorvex::NetvpdRun run(db);
     const mtms* first = nullptr;
     for (int call = 1; call <= 3; ++call) {
-      const mtms* m = c.cec ? run.farCec(c.frame, c.cage) : run.farChassis(c.frame, c.cage);
+      if (c.kind == kBpa) {
+        EXPECT_EQ(run.bpaMtmsAt(c.frame, c.cage).text(), c.found ? c.found : "*")
+            << c.name << ", call " << call;
+        continue;
+      }
+      const mtms* m =
+          c.kind == kCec ? run.farCec(c.frame, c.cage) : run.farChassis(c.frame, c.cage);
       if (c.found == nullptr) {
         EXPECT_EQ(m, nullptr) << c.name << ", call " << call;
         continue;
