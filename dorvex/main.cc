@@ -1,6 +1,7 @@
 // dorvex: prints the vital product data of the installation's hardware.
 #include <unistd.h>
 
+#include <csignal>
 #include <cstdio>
 #include <cstdlib>
 
@@ -9,8 +10,18 @@
 #include "process_flags.h"
 #include "settings.h"
 
+namespace {
+
+// The tables are mapped, not copied. Our producers never shrink a table in place, but a table
+// cut short by hand while a request runs would fault the mapping: end as for a database that
+// cannot be read, rather than with a crash.
+extern "C" void tableVanished(int) { _exit(dorvex::kExitNoDatabase); }
+
+}  // namespace
+
 int main(int argc, char** argv) {
   using namespace dorvex;
+  std::signal(SIGBUS, tableVanished);
   // A network VPD request writes megabytes; the default buffer of a file or pipe would
   // cost a write call every 4 KiB. A terminal stays line-buffered, so that a person
   // watching sees each line as it comes.
