@@ -4,11 +4,22 @@
 
 #include <cstdint>
 #include <cstring>
+#include <memory>
 
 #include "locid.h"
+#include "table_buffer.h"
 #include "table_desc.h"
 
 namespace vpd {
+
+// How a table gets into memory. A table of at least copy_from_bytes is read into a buffer of
+// huge pages where the kernel offers them; a smaller one is mapped. Tests change it to take
+// each path.
+struct SnapshotPolicy {
+  std::size_t copy_from_bytes = std::size_t{1} << 20;
+  bool (*huge_pages_offered)() = hugePagesOffered;
+};
+SnapshotPolicy& snapshotPolicy();
 
 class TableSnapshot {
  public:
@@ -38,9 +49,10 @@ class TableSnapshot {
   }
 
  private:
-  unsigned char* data_ = nullptr;
-  std::size_t capacity_ = 0;  // bytes of the buffer
-  bool mapped_file_ = false;  // data_ maps the file itself
+  const unsigned char* data_ = nullptr;
+  void* mapping_ = nullptr;  // the file's own pages, when mapped
+  std::size_t mapped_bytes_ = 0;
+  std::unique_ptr<TableBuffer> copy_;  // a copy of the records, when not mapped
   std::size_t record_size_;
   std::size_t count_ = 0;
 };
