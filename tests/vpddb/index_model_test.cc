@@ -4,6 +4,7 @@
 #include <random>
 
 #include "table_io.h"
+#include "table_snapshot.h"
 #include "vpd_test_util.h"
 
 namespace {
@@ -30,7 +31,17 @@ std::string generate(std::mt19937& rng, int count, unsigned type) {
   for (int i = 0; i < count; ++i) {
     Record r;
     if (pick(rng) != 0) {  // one record in ten stays all zero: a hole
-      r.loc_id = loc_id_t(small(rng), small(rng), chip(rng), type, small(rng) & 1, net(rng));
+      // Half the records continue the previous one's frame and cage, as a producer stores
+      // a device's records together; the others land anywhere, so keys recur apart.
+      unsigned frame = small(rng), cage = small(rng);
+      if (pick(rng) < 5 && i > 0) {
+        loc_id_t prev;
+        std::memcpy(static_cast<void*>(&prev), bytes.data() + bytes.size() - sizeof(Record),
+                    sizeof prev);
+        frame = prev.getFrame();
+        cage = prev.getCage();
+      }
+      r.loc_id = loc_id_t(frame, cage, chip(rng), type, small(rng) & 1, net(rng));
       mtms m(tms[small(rng) % 3], std::to_string(small(rng)).c_str());
       std::memcpy(reinterpret_cast<char*>(&r) + (type == SMA   ? 108
                                                  : type == BPA ? 32
@@ -55,24 +66,36 @@ std::vector<std::string> keys(const std::list<T>& l) {
 }
 
 void* noMap(int, size_t) { return nullptr; }
+bool offered() { return true; }
 
-// Tables are mapped where the file allows it and read into memory otherwise: both must give
-// the same answers.
-class IndexModelTest : public vpdtest::VpdTest, public ::testing::WithParamInterface<bool> {
+// The ways a table gets into memory; all must give the same answers.
+enum class Snapshot { kMapped, kReadWhereMappingFails, kCopiedIntoHugePages };
+
+class IndexModelTest : public vpdtest::VpdTest, public ::testing::WithParamInterface<Snapshot> {
  protected:
   void SetUp() override {
     vpdtest::VpdTest::SetUp();
-    saved_ = vpd::fileOps();
-    if (!GetParam()) vpd::fileOps().map = noMap;
+    saved_ops_ = vpd::fileOps();
+    saved_policy_ = vpd::snapshotPolicy();
+    vpd::snapshotPolicy().copy_from_bytes = SIZE_MAX;
+    if (GetParam() == Snapshot::kReadWhereMappingFails) vpd::fileOps().map = noMap;
+    if (GetParam() == Snapshot::kCopiedIntoHugePages) {
+      vpd::snapshotPolicy().copy_from_bytes = 0;
+      vpd::snapshotPolicy().huge_pages_offered = offered;
+    }
   }
   void TearDown() override {
-    vpd::fileOps() = saved_;
+    vpd::fileOps() = saved_ops_;
+    vpd::snapshotPolicy() = saved_policy_;
     vpdtest::VpdTest::TearDown();
   }
-  vpd::FileOps saved_;
+  vpd::FileOps saved_ops_;
+  vpd::SnapshotPolicy saved_policy_;
 };
 
-INSTANTIATE_TEST_SUITE_P(MappedOrRead, IndexModelTest, ::testing::Bool());
+INSTANTIATE_TEST_SUITE_P(EveryWayIn, IndexModelTest,
+                         ::testing::Values(Snapshot::kMapped, Snapshot::kReadWhereMappingFails,
+                                           Snapshot::kCopiedIntoHugePages));
 
 TEST_P(IndexModelTest, IndexedLookupsAgreeWithAPlainScan) {
   for (unsigned seed = 1; seed <= 6; ++seed) {

@@ -12,10 +12,26 @@ constexpr unsigned int kMaxCage = (1u << loc_id_t::kUidWidth) - 1;
 constexpr unsigned int kNetworks = 1u << loc_id_t::kNetworkWidth;
 
 uint32_t frameCageKey(loc_id_t l) { return (l.getFrame() << 8) | l.getCage(); }
-uint64_t entry(uint32_t key, std::size_t record) { return uint64_t{key} << 32 | record; }
 
-RecordRange rangeOf(const std::vector<uint64_t>& v) {
+RecordRange rangeOf(const std::vector<Run>& v) {
   return RecordRange{v.data(), v.data() + v.size()};
+}
+
+// Appends record i with its key to runs, extending the last run when i continues it.
+void addRecord(std::vector<Run>& runs, uint32_t key, std::size_t i) {
+  const auto record = static_cast<uint32_t>(i);
+  if (!runs.empty()) {
+    Run& last = runs.back();
+    if (last.key == key && last.first + last.count == record) {
+      ++last.count;
+      return;
+    }
+  }
+  runs.push_back(Run{key, record, 1});
+}
+
+bool byKeyThenPosition(const Run& a, const Run& b) {
+  return a.key != b.key ? a.key < b.key : a.first < b.first;
 }
 
 }  // namespace
@@ -26,17 +42,18 @@ RecordRange TableIndex::lookup(Grouping& g, uint32_t key, KeyOf key_of) {
   if (g.sorted.empty() && g.uses++ == 0) {
     scratch_.clear();
     for (std::size_t i = 0; i < n; ++i) {
-      if (key_of(snapshot_.location(i)) == key) scratch_.push_back(entry(key, i));
+      if (key_of(snapshot_.location(i)) == key) addRecord(scratch_, key, i);
     }
     return rangeOf(scratch_);
   }
   if (g.sorted.empty()) {
-    g.sorted.reserve(n);
-    for (std::size_t i = 0; i < n; ++i) g.sorted.push_back(entry(key_of(snapshot_.location(i)), i));
-    std::sort(g.sorted.begin(), g.sorted.end());
+    for (std::size_t i = 0; i < n; ++i) addRecord(g.sorted, key_of(snapshot_.location(i)), i);
+    std::sort(g.sorted.begin(), g.sorted.end(), byKeyThenPosition);
   }
-  auto lo = std::lower_bound(g.sorted.begin(), g.sorted.end(), entry(key, 0));
-  auto hi = std::upper_bound(lo, g.sorted.end(), entry(key, 0xffffffffu));
+  auto lo = std::lower_bound(g.sorted.begin(), g.sorted.end(), key,
+                             [](const Run& r, uint32_t k) { return r.key < k; });
+  auto hi =
+      std::upper_bound(lo, g.sorted.end(), key, [](uint32_t k, const Run& r) { return k < r.key; });
   return RecordRange{g.sorted.data() + (lo - g.sorted.begin()),
                      g.sorted.data() + (hi - g.sorted.begin())};
 }
@@ -75,7 +92,7 @@ RecordRange TableIndex::firstByMtms(const mtms& key) {
   if (mtms_uses_++ == 0) {
     for (std::size_t i = 0; i < n; ++i) {
       if (recordMtms(i) == key) {
-        scratch_.push_back(entry(0, i));
+        addRecord(scratch_, 0, i);
         break;
       }
     }
@@ -87,7 +104,7 @@ RecordRange TableIndex::firstByMtms(const mtms& key) {
     }
   }
   auto it = first_by_mtms_.find(mtmsKey(key));
-  if (it != first_by_mtms_.end()) scratch_.push_back(entry(0, it->second));
+  if (it != first_by_mtms_.end()) addRecord(scratch_, 0, it->second);
   return rangeOf(scratch_);
 }
 
@@ -96,7 +113,7 @@ RecordRange TableIndex::firstOfEachFrameCage() {
   std::unordered_set<uint32_t> seen;
   for (std::size_t i = 0; i < snapshot_.count(); ++i) {
     uint32_t key = frameCageKey(snapshot_.location(i));
-    if (seen.insert(key).second) scratch_.push_back(entry(key, i));
+    if (seen.insert(key).second) scratch_.push_back(Run{key, static_cast<uint32_t>(i), 1});
   }
   return rangeOf(scratch_);
 }

@@ -17,15 +17,21 @@
 
 namespace vpd {
 
-// Entries are (key << 32 | record number); the record number is the low half.
-inline uint32_t recordOf(uint64_t entry) { return static_cast<uint32_t>(entry); }
+// Records first .. first + count - 1, which share a key. Producers store a device's records
+// together, so a table is mostly long runs: grouping runs instead of records makes the
+// groupings several times smaller than the tables' record counts.
+struct Run {
+  uint32_t key;
+  uint32_t first;
+  uint32_t count;
+};
 
-// A run of entries, in table order.
+// Runs of records, in table order.
 struct RecordRange {
-  const uint64_t* first = nullptr;
-  const uint64_t* last = nullptr;
-  const uint64_t* begin() const { return first; }
-  const uint64_t* end() const { return last; }
+  const Run* first = nullptr;
+  const Run* last = nullptr;
+  const Run* begin() const { return first; }
+  const Run* end() const { return last; }
   bool empty() const { return first == last; }
 };
 
@@ -47,7 +53,7 @@ class TableIndex {
  private:
   struct Grouping {
     int uses = 0;
-    std::vector<uint64_t> sorted;  // by key, then record number
+    std::vector<Run> sorted;  // by key, then table order
   };
   template <class KeyOf>
   RecordRange lookup(Grouping& g, uint32_t key, KeyOf key_of);
@@ -56,7 +62,7 @@ class TableIndex {
 
   const TableSnapshot& snapshot_;
   const TableDesc& desc_;
-  std::vector<uint64_t> scratch_;  // answer of the latest plain pass
+  std::vector<Run> scratch_;  // answer of the latest plain pass
 
   Grouping frame_cage_, frame_, network_;
   int mtms_uses_ = 0;

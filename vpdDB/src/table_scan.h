@@ -25,12 +25,14 @@ ScanOutcome scanTable(Table& t, RecordRange candidates, Take take, Select select
   if (snapshot.count() == 0) return ScanOutcome::kEmptyTable;
   bool selected = false;
   Record scan_record;
-  for (uint64_t entry : candidates) {
-    snapshot.copyInto(recordOf(entry), scan_record);
-    if (!select(scan_record)) continue;
-    accept(scan_record);
-    selected = true;
-    if (take == Take::kFirst) break;
+  for (const Run& run : candidates) {
+    for (uint32_t i = run.first; i != run.first + run.count; ++i) {
+      snapshot.copyInto(i, scan_record);
+      if (!select(scan_record)) continue;
+      accept(scan_record);
+      if (take == Take::kFirst) return ScanOutcome::kSelected;
+      selected = true;
+    }
   }
   return selected ? ScanOutcome::kSelected : ScanOutcome::kNoneSelected;
 }
