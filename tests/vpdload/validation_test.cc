@@ -172,6 +172,25 @@ std::vector<BadCase> badCases() {
        deep(40),
        {"[0][0][0][0][0][0][0][0][0][0][0][0][0][0][0][0][0][0][0][0][0][0][0][0][0][0][0][0][0]"
         "[0][0][0]: nested deeper than 32 levels"}},
+      // Records are checked as they are read: indexes and paths hold across the records
+      // already checked, the document's own faults come first, tables in document order,
+      // and a document that turns out malformed reports only that.
+      {"a value that is not a record, then a bad record",
+       R"({"sma": [1, {"loc": {"frame": 5000}}]})",
+       {"sma[0]: expected an object", "sma[1].loc.frame: 5000 does not fit 12 bits, at most 4095"}},
+      {"key given twice after records already checked",
+       R"({"sma": [{}, {}, {"fru": {}, "fru": {}}]})",
+       {"sma[2].fru: key given twice"}},
+      {"unknown top-level key after a bad record",
+       R"({"sma": [{"cec": 1}], "smas": [1]})",
+       {"smas: unknown key; expected one of sma, chassis, bpa", "sma[0].cec: expected an object"}},
+      {"tables in document order",
+       R"({"bpa": [{"mtms": 1}], "sma": [{"cec": 1}]})",
+       {"bpa[0].mtms: expected an object", "sma[0].cec: expected an object"}},
+      {"bad records, then malformed JSON",
+       R"({"sma": [{"loc": {"frame": 5000}}, {"cec": 1}, )",
+       {"parse error at line 1, column 48: syntax error while parsing value - unexpected end of "
+        "input; expected '[', '{', or a literal"}},
       // Several problems: all are reported, the first twenty shown.
       {"three problems in one record",
        R"({"chassis": [{"loc": {"frame": 5000}, "mtms": {"tm": "123456789"}, "dca2": []}]})",

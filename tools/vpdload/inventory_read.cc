@@ -2,6 +2,7 @@
 // FieldReader reads.
 #include <cstdint>
 #include <map>
+#include <type_traits>
 
 #include "field_reader.h"
 #include "inventory_schema.h"
@@ -26,13 +27,26 @@ constexpr IntRange kSlot{0, chassisVPD::kRiserSlots - 1, 4, "a riser slot"};
 // could be read, so that it can take part in the check for a location given twice.
 class RecordReader : public FieldReader {
  public:
-  using FieldReader::FieldReader;
+  explicit RecordReader(Problems* problems, Inventory* inv) : FieldReader(problems), inv_(inv) {}
 
-  void document(const json& doc, Inventory* inv) {
+  // One element of a table's array, as it is read.
+  void element(const std::string& table, std::size_t index, const json& v) {
+    if (table == "sma") {
+      readRecord(v, "sma", index, &inv_->sma, &sma_seen_);
+    } else if (table == "chassis") {
+      readRecord(v, "chassis", index, &inv_->chassis, &chassis_seen_);
+    } else if (table == "bpa") {
+      readRecord(v, "bpa", index, &inv_->bpa, &bpa_seen_);
+    }
+  }
+
+  // The document's frame, once every element has been read: its members and their kinds.
+  void frame(const json& doc) {
     if (!object(doc, "", {"sma", "chassis", "bpa"})) return;
-    readTable(doc, "sma", SMA, &inv->sma);
-    readTable(doc, "chassis", CHASSIS, &inv->chassis);
-    readTable(doc, "bpa", BPA, &inv->bpa);
+    for (const char* name : {"sma", "chassis", "bpa"}) {
+      const json* table = member(doc, name);
+      if (table != nullptr && !table->is_array()) problem(name, "expected an array");
+    }
   }
 
  private:
@@ -149,53 +163,57 @@ class RecordReader : public FieldReader {
     return loc_id_t(loc.getFrame(), loc.getCage(), with_chip ? loc.getChip() : 0, 0, 0, 0).toInt();
   }
 
+  // Storage keys already read, with the index of the record that had each first.
+  using Seen = std::map<std::uint32_t, std::size_t>;
+
   template <typename Record>
-  void readTable(const json& doc, const char* name, int type, std::vector<Record>* out) {
-    const json* table = member(doc, name);
-    if (table == nullptr) return;
-    if (!table->is_array()) {
-      problem(name, "expected an array");
-      return;
-    }
-    bool with_chip = type == SMA;
-    std::map<std::uint32_t, std::size_t> first;
-    out->reserve(table->size());
-    for (std::size_t i = 0; i < table->size(); ++i) {
-      std::string path = indexPath(name, i);
-      out->emplace_back();
-      if (!record((*table)[i], path, &out->back())) continue;
-      loc_id_t loc = out->back().loc_id;
-      auto seen = first.emplace(storageKey(loc, with_chip), i);
-      if (seen.second) continue;
-      std::string where =
-          "frame " + std::to_string(loc.getFrame()) + ", cage " + std::to_string(loc.getCage());
-      if (with_chip) where += ", chip " + std::to_string(loc.getChip());
-      problem(keyPath(path, "loc"),
-              where + " again (first at " + indexPath(name, seen.first->second) + ")");
-    }
+  void readRecord(const json& v, const char* name, std::size_t i, std::vector<Record>* out,
+                  Seen* first) {
+    std::string path = indexPath(name, i);
+    out->emplace_back();
+    if (!record(v, path, &out->back())) return;
+    loc_id_t loc = out->back().loc_id;
+    const bool with_chip = std::is_same<Record, smaVPD>::value;
+    auto seen = first->emplace(storageKey(loc, with_chip), i);
+    if (seen.second) return;
+    std::string where =
+        "frame " + std::to_string(loc.getFrame()) + ", cage " + std::to_string(loc.getCage());
+    if (with_chip) where += ", chip " + std::to_string(loc.getChip());
+    problem(keyPath(path, "loc"),
+            where + " again (first at " + indexPath(name, seen.first->second) + ")");
   }
+
+  Inventory* inv_;
+  Seen sma_seen_, chassis_seen_, bpa_seen_;
 };
 
 }  // namespace
 
 const char* typeName(unsigned type) { return type < 8 ? kTypeNames[type] : ""; }
 
-Problems readInventory(const json& doc, Inventory* inv) {
+// The records are read as the parser meets them, so that a large inventory is never held
+// whole as JSON values.
+Problems parseInventory(const std::string& text, Inventory* inv) {
   Problems problems;
   *inv = Inventory();
-  RecordReader(&problems).document(doc, inv);
-  return problems;
-}
-
-Problems parseInventory(const std::string& text, Inventory* inv) {
-  json doc;
+  RecordReader reader(&problems, inv);
+  json frame;
   std::string error;
-  if (!parseJson(text, &doc, &error)) {
-    Problems problems;
-    problems.add(error);
-    return problems;
+  bool parsed =
+      parseJsonStreaming(text, &frame, &error,
+                         [&reader](const std::string& table, std::size_t index,
+                                   const json& element) { reader.element(table, index, element); });
+  if (!parsed) {
+    Problems malformed;  // what the records had wrong before the fault no longer matters
+    malformed.add(error);
+    return malformed;
   }
-  return readInventory(doc, inv);
+  // The document's own faults come first, as they are the ones to mend first.
+  Problems all;
+  RecordReader(&all, inv).frame(frame);
+  for (std::string& p : problems.list) all.add(std::move(p));
+  all.total += problems.total - problems.list.size();
+  return all;
 }
 
 }  // namespace vpdload

@@ -44,8 +44,6 @@ struct Problems {
 // Checks the whole JSON text of an inventory and fills `inv` with its records in array
 // order. On any problem `inv` is left in an unspecified state and must not be stored.
 Problems parseInventory(const std::string& text, Inventory* inv);
-// The same for a document that is already parsed.
-Problems readInventory(const nlohmann::json& doc, Inventory* inv);
 
 // The inventory that parseInventory turns back into exactly these records: texts up to
 // their first NUL, empty members left out, texts that are not UTF-8 as {"hex": ...}.
