@@ -7,9 +7,9 @@
 # Builds Release in build-bench/ (BUILD_DIR overrides), generates one installation per
 # scale (scale 64: 1024 switch chassis on one network, 4096 CECs with 8 SMA records each,
 # 256 frames, about 8 MB of tables), and for each request prints the fastest wall time and
-# the mean CPU time of the request and of its floor, their ratio, the growth from the
-# previous size and the peak memory. Takes a few minutes (five and a half on two busy cores).
-# Needs hyperfine, /usr/bin/time and python3.
+# the median CPU time of the request and of its floor (run alternately by time_pair.py),
+# their ratio, the growth from the previous size and the peak memory. Takes about two
+# minutes. Needs /usr/bin/time and python3.
 #
 # The targets are checked on CPU time (user + system of the process and its children, which
 # is what a request costs whatever else the machine runs); --wall checks the fastest wall
@@ -20,8 +20,8 @@ here=$(cd "$(dirname "$0")" && pwd)
 repo=$(dirname "$here")
 build=${BUILD_DIR:-$repo/build-bench}
 scales=(1 4 16 64)
-runs=15
-import_runs=5
+runs=21
+import_runs=7
 do_build=1
 keep=""
 judge=cpu
@@ -38,7 +38,7 @@ while [ $# -gt 0 ]; do
   esac
 done
 
-for tool in hyperfine /usr/bin/time python3; do
+for tool in /usr/bin/time python3; do
   command -v "$tool" >/dev/null || { echo "run_scale.sh: $tool is needed" >&2; exit 2; }
 done
 
@@ -66,21 +66,6 @@ export CHRONICLE_LOG=/dev/null
 results=$work/results.tsv
 : >"$results"
 
-# The fastest wall time of a hyperfine JSON export and the mean CPU time (user + system),
-# in milliseconds. The fastest run is the one least disturbed by other work on the machine.
-times_ms() {
-  python3 -c 'import json,sys; r = json.load(open(sys.argv[1]))["results"][0]; print("%.3f\t%.3f" % (r["min"] * 1000, (r["user"] + r["system"]) * 1000))' "$1"
-}
-
-# time_cmd NAME RUNS CMD...: fastest wall and mean CPU milliseconds on stdout
-time_cmd() {
-  local name=$1 n=$2
-  shift 2
-  hyperfine -N --warmup 2 --runs "$n" --export-json "$work/$name.json" "$(printf '%q ' "$@")" \
-    >/dev/null 2>&1 || { echo "run_scale.sh: timing '$*' failed" >&2; exit 1; }
-  times_ms "$work/$name.json"
-}
-
 # peak_kib CMD...: the largest resident set of the command, in KiB
 peak_kib() {
   /usr/bin/time -v "$@" 2>&1 >/dev/null | awk -F': ' '/Maximum resident set size/ {print $2}'
@@ -90,12 +75,12 @@ peak_kib() {
 measure() {
   local request=$1 scale=$2 table_bytes=$3 n=$4 floor_files=$5
   shift 5
-  local t f kib
-  t=$(time_cmd "$request-$scale" "$n" "$@")
+  local times kib
   # shellcheck disable=SC2086  # the floor files are a list
-  f=$(time_cmd "$request-$scale-floor" "$n" cat $floor_files)
+  times=$("$here/time_pair.py" "$n" -- "$@" -- cat $floor_files) ||
+    { echo "run_scale.sh: timing '$*' failed" >&2; exit 1; }
   kib=$(peak_kib "$@")
-  printf '%s\t%s\t%s\t%s\t%s\t%s\n' "$request" "$scale" "$table_bytes" "$t" "$f" "$kib" >>"$results"
+  printf '%s\t%s\t%s\t%s\t%s\n' "$request" "$scale" "$table_bytes" "$times" "$kib" >>"$results"
 }
 
 for scale in "${scales[@]}"; do

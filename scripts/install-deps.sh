@@ -2,7 +2,7 @@
 # Installs the Debian packages the build, the tests and the tools need, if any is missing.
 set -euo pipefail
 packages=(cmake make g++ clang libclang-rt-dev lld libgtest-dev libgmock-dev
-          libbenchmark-dev nlohmann-json3-dev time python3 hyperfine)
+          libbenchmark-dev nlohmann-json3-dev time python3)
 missing=()
 for p in "${packages[@]}"; do
   dpkg-query -W -f='${Status}' "$p" 2>/dev/null | grep -q "install ok installed" || missing+=("$p")
