@@ -5,11 +5,11 @@
 
 Prints four tab-separated numbers in milliseconds: the fastest wall time and the median CPU
 time (user + system of the process and the children it waited for) of COMMAND, then the
-same for FLOOR. Standard output and error of both go to /dev/null. Alternating the runs makes both
-see the same machine: on a shared virtual machine the speed of the host drifts by tens of
-percent from one minute to the next, which timing all runs of one and then all runs of the
-other turns into a false ratio. The median leaves out the runs that a burst of other work
-disturbed. Exits 1 when a run of either ends with a status other than 0.
+same for FLOOR. Standard output and error of both go to /dev/null. Alternating the runs
+makes both see the same machine: on a shared virtual machine the speed of the host drifts
+by tens of percent from one minute to the next, which timing all runs of one and then all
+runs of the other turns into a false ratio. The median leaves out the runs that a burst of
+other work disturbed. Exits 1 when a run of either ends with a status other than 0.
 """
 import os
 import statistics
