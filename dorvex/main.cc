@@ -12,7 +12,7 @@
 
 namespace {
 
-// The tables are mapped, not copied. Our producers never shrink a table in place, but a table
+// Small tables are mapped, not copied. Our producers never shrink a table in place, but a table
 // cut short by hand while a request runs would fault the mapping: end as for a database that
 // cannot be read, rather than with a crash.
 extern "C" void tableVanished(int) { _exit(dorvex::kExitNoDatabase); }

@@ -200,9 +200,10 @@ Problems parseInventory(const std::string& text, Inventory* inv) {
   json frame;
   std::string error;
   bool parsed =
-      parseJsonStreaming(text, &frame, &error,
-                         [&reader](const std::string& table, std::size_t index,
-                                   const json& element) { reader.element(table, index, element); });
+      parseJson(text, &frame, &error,
+                [&reader](const std::string& table, std::size_t index, const json& element) {
+                  reader.element(table, index, element);
+                });
   if (!parsed) {
     Problems malformed;  // what the records had wrong before the fault no longer matters
     malformed.add(error);

@@ -48,7 +48,7 @@ std::string parseMessage(const char* what) {
 // the last value) and at nesting deeper than kMaxJsonDepth.
 class StrictBuilder : public nlohmann::json_sax<json> {
  public:
-  StrictBuilder(json* root, const ElementSink* sink) : root_(root), sink_(sink) {}
+  StrictBuilder(json* root, const ElementSink& sink) : root_(root), sink_(sink) {}
 
   const std::string& error() const { return error_; }
 
@@ -102,8 +102,8 @@ class StrictBuilder : public nlohmann::json_sax<json> {
   // An element of an array in the top-level object, read whole, goes to the sink; its
   // place in the array stays, as null, so that the indexes of the next ones hold.
   void handOver(json& element) {
-    if (sink_ == nullptr || !open_[0]->is_object() || !open_[1]->is_array()) return;
-    (*sink_)(keys_[0], open_[1]->size() - 1, element);
+    if (!open_[0]->is_object() || !open_[1]->is_array()) return;
+    sink_(keys_[0], open_[1]->size() - 1, element);
     element = nullptr;
   }
 
@@ -142,7 +142,7 @@ class StrictBuilder : public nlohmann::json_sax<json> {
   }
 
   json* root_;
-  const ElementSink* sink_;
+  const ElementSink& sink_;
   std::vector<json*> open_;        // the arrays and objects being read, outermost first
   std::vector<std::string> keys_;  // for objects: the key of the member being read
   std::string error_;
@@ -159,25 +159,12 @@ std::string indexPath(const std::string& parent, std::size_t index) {
   return parent + "[" + std::to_string(index) + "]";
 }
 
-namespace {
-
-bool parse(const std::string& text, json* doc, std::string* error, const ElementSink* sink) {
+bool parseJson(const std::string& text, json* doc, std::string* error, const ElementSink& sink) {
   *doc = json();
   StrictBuilder builder(doc, sink);
   if (json::sax_parse(text, &builder)) return true;
   *error = builder.error();
   return false;
-}
-
-}  // namespace
-
-bool parseJson(const std::string& text, json* doc, std::string* error) {
-  return parse(text, doc, error, nullptr);
-}
-
-bool parseJsonStreaming(const std::string& text, json* doc, std::string* error,
-                        const ElementSink& sink) {
-  return parse(text, doc, error, &sink);
 }
 
 }  // namespace vpdload
